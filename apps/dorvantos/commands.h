@@ -1,0 +1,16 @@
+#pragma once
+// The verbs of the dorvantos command line. Each takes the arguments after its verb and
+// returns the exit status: 0 done, 1 failed, 2 wrong arguments (usage printed).
+
+#include <string>
+#include <vector>
+
+namespace app {
+
+using Args = std::vector<std::string>;
+
+int RunReg(const Args& args);         // reg query|add|delete|import|export
+int RunRegister(const Args& args);    // register [LIBRARY...]
+int RunUnregister(const Args& args);  // unregister [LIBRARY...]
+
+}  // namespace app

@@ -1,0 +1,59 @@
+// dorvantos: the reference host of the component. With no verb it opens the journal
+// editor; the verbs set up and look after what the component needs on this machine.
+
+#include <fmt/format.h>
+
+#include <cstdio>
+#include <functional>
+#include <map>
+#include <string>
+
+#include "commands.h"
+#include "platform/registry/Store.h"
+
+namespace {
+
+constexpr const char* kUsage =
+    "usage: dorvantos [--registry FILE] VERB [ARGS...]\n"
+    "\n"
+    "verbs:\n"
+    "  --version                  print the version\n"
+    "  register [LIBRARY...]      register the component and its peers in the settings store\n"
+    "  unregister [LIBRARY...]    remove their registration\n"
+    "  reg query PATH [NAME]      show a key's values, or one value\n"
+    "  reg add PATH NAME VALUE    write a string value (creates the key)\n"
+    "  reg delete PATH [NAME]     delete a value, or a key with everything below it\n"
+    "  reg import FILE            merge a .reg file into the settings store\n"
+    "  reg export PATH FILE       write a key and everything below it to a .reg file\n";
+
+int Usage() {
+  std::fputs(kUsage, stderr);
+  return 2;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  app::Args args(argv + 1, argv + argc);
+  // A settings file named on the command line wins over the environment.
+  if (args.size() >= 2 && args[0] == "--registry") {
+    registry::Store::SetDefaultPath(args[1]);
+    args.erase(args.begin(), args.begin() + 2);
+  }
+  if (args.empty()) return Usage();
+
+  const std::string verb = args[0];
+  const app::Args rest(args.begin() + 1, args.end());
+  if (verb == "--version") {
+    fmt::print("dorvantos {}\n", DV_VERSION);
+    return 0;
+  }
+  static const std::map<std::string, std::function<int(const app::Args&)>> verbs = {
+      {"register", app::RunRegister},
+      {"unregister", app::RunUnregister},
+      {"reg", app::RunReg},
+  };
+  const auto it = verbs.find(verb);
+  if (it == verbs.end()) return Usage();
+  return it->second(rest);
+}
