@@ -29,6 +29,7 @@ inline constexpr long ERROR_INVALID_PARAMETER = 87;
 inline constexpr long ERROR_MORE_DATA = 234;
 inline constexpr long ERROR_NO_MORE_ITEMS = 259;
 inline constexpr long ERROR_BADDB = 1009;  // the store file cannot be read or written
+inline constexpr long ERROR_KEY_DELETED = 1018;  // the open key was deleted meanwhile
 
 inline constexpr uint32_t REG_NONE = 0;
 inline constexpr uint32_t REG_SZ = 1;
@@ -46,18 +47,25 @@ inline constexpr uint32_t KEY_ALL_ACCESS = 0xF003F;
 
 // The root name ("HKEY_LOCAL_MACHINE") of a predefined handle, "" for any other.
 std::string RootName(HKEY root);
+// The predefined handle of a root name, ignoring case; 0 for any other name.
+HKEY RootHandle(std::string_view name);
+
+// Handles are process-wide; every call may come from any thread. A failure of the
+// store file (unreadable, malformed, not writable) comes back as ERROR_BADDB.
 
 long RegOpenKeyEx(HKEY root, std::string_view subKey, uint32_t options, uint32_t samDesired,
                   HKEY* result);
+// Creates the key and its missing ancestors; an existing key is simply opened.
 long RegCreateKeyEx(HKEY root, std::string_view subKey, HKEY* result);
 long RegCloseKey(HKEY key);
 // With data null, reports the size in cbData. A buffer too small gives ERROR_MORE_DATA.
 long RegQueryValueEx(HKEY key, std::string_view valueName, uint32_t* type, char* data,
                      uint32_t* cbData);
+// Data of the string types comes with its terminating zero, counted in cbData.
 long RegSetValueEx(HKEY key, std::string_view valueName, uint32_t type, const char* data,
                    uint32_t cbData);
 long RegDeleteValue(HKEY key, std::string_view valueName);
-// Deletes a key and everything below it.
+// Deletes a key and everything below it; with an empty subKey, empties the key.
 long RegDeleteTree(HKEY root, std::string_view subKey);
 long RegEnumKey(HKEY key, uint32_t index, std::string* name);
 long RegEnumValue(HKEY key, uint32_t index, std::string* name, uint32_t* type);
