@@ -1,0 +1,40 @@
+#pragma once
+// What the two public classes share: the members a host reaches by name, Login and
+// NovoRegisto. They differ only in how Registo finds the entry to open.
+//
+// Members, in the order of the class's interface:
+//   Login([ByRef User As String], [ByRef Password As String]) As Boolean
+//   NovoRegisto(ByRef Table As String, [Pkey], [Contacto_ID As Long], [Caller As Object])
+//   Registo(ByRef tRs As Recordset, [Pkey], [Tabela As String], [StrWhere As String],
+//           [Caller As Object])
+
+#include <cstdint>
+#include <string>
+
+#include "platform/automation/Dispatch.h"
+#include "platform/automation/InprocServer.h"
+#include "platform/vb/Variant.h"
+
+namespace component {
+
+// The live class objects of the component, which DllCanUnloadNow answers from.
+automation::ObjectCounter& LiveObjects();
+
+class ClassObject : public automation::Dispatch<ClassObject> {
+ public:
+  static const automation::MemberTable<ClassObject>& Members();
+
+  // Puts the host's user's login in place; true when it is.
+  bool Login(std::string& User, std::string& Password);
+  // Starts a new entry in the header editor.
+  void NovoRegisto(std::string& Table, const vb::Variant& Pkey, int32_t Contacto_ID,
+                   const vb::ObjectPtr& Caller);
+  // Opens an existing entry in the header editor, found through the host's recordset.
+  virtual void Registo(vb::Variant& tRs, const vb::Variant& Pkey, const std::string& Tabela,
+                       const std::string& StrWhere, const vb::ObjectPtr& Caller) = 0;
+
+ private:
+  automation::ObjectCounter::ObjectLock alive_{LiveObjects()};
+};
+
+}  // namespace component

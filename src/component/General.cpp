@@ -1,0 +1,16 @@
+#include "component/General.h"
+
+#include "common/ErrorTrap.h"
+#include "component/LoginState.h"
+
+namespace component {
+
+void General::Registo(vb::Variant& tRs, const vb::Variant& Pkey, const std::string& Tabela,
+                      const std::string& StrWhere, const vb::ObjectPtr& Caller) {
+  common::Trap(common::ClassSite("Registo"), [&] {
+    if (!IsLoggedIn()) return;
+    // Tabela and StrWhere are not used: Pkey alone names the entry.
+  });
+}
+
+}  // namespace component
