@@ -18,6 +18,26 @@
 
 namespace common {
 
+// The reporter every trap hands its errors to.
+inline constexpr const char* kReporterProgId = "Ravelport.General";
+
+// The labels of the reports, where they are not a form's or a module's own name.
+inline constexpr const char* kProductLabel = "POC Dorvantos";
+inline constexpr const char* kLoginProjectLabel = "Ligação";     // Login, the connection
+inline constexpr const char* kClassProjectLabel = "Registos";    // NovoRegisto, Registo
+inline constexpr const char* kEntryProjectLabel = "Dorvantos";   // the entry's windows
+inline constexpr const char* kFinderProjectLabel = "Cordavel";   // the account finder
+inline constexpr const char* kControlFillLabel = "ControlFill";
+inline constexpr const char* kRegistryProductLabel = "Módulo de Registo";
+inline constexpr const char* kRegistryProjectLabel = "Configuração";
+inline constexpr const char* kFechosProjectLabel = "Fechos";
+inline constexpr const char* kCodeProjectLabel = "Código";
+inline constexpr const char* kDataProjectLabel = "Dados";
+
+// The numbers a trap gives failures that are no Basic error.
+inline constexpr int32_t kErrOutOfMemory = 7;
+inline constexpr int32_t kErrInternal = 51;  // any other exception; its what() describes it
+
 // The extra condition a kind of procedure puts on reporting.
 enum class TrapRule {
   Always,    // any description
@@ -52,11 +72,15 @@ TrapSite DataSite(const std::string& procedure);              // modData
 std::string ReportMessage(const TrapSite& site, int32_t number, const std::string& description);
 // Whether an error at this site is reported at all.
 bool ShouldReport(const TrapSite& site, int32_t number, const std::string& description);
-// Reports an error when the site's rules allow it. Never throws.
+// Reports an error when the site's rules allow it, through a fresh reporter made for
+// this one report. Never throws: when the reporter is missing or fails, the report goes
+// to the standard error stream instead, so it is not lost without a trace.
 void ReportError(const TrapSite& site, int32_t number, const std::string& description);
 
 // Runs body under the trap. On an error: onError first (its own failure is ignored),
-// then the report. Returns true when body ended without an error.
+// then the report. Returns true when body ended without an error. Nothing escapes:
+// a vb::Error keeps its number and description, any other exception is reported as
+// kErrInternal with its what().
 bool Trap(const TrapSite& site, const std::function<void()>& body,
           const std::function<void()>& onError = {});
 
