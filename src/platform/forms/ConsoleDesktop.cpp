@@ -4,6 +4,8 @@
 
 #include <cstdio>
 
+#include "platform/forms/Form.h"
+
 namespace forms {
 
 namespace {
@@ -37,6 +39,14 @@ std::string ConsoleDesktop::InputBox(const InputRequest& request) {
              request.defaultText);
   std::fflush(stderr);
   return request.defaultText;
+}
+
+void ConsoleDesktop::WaitWhileVisible(Form& form) {
+  if (!form.Showing()) return;
+  fmt::print(stderr, "[{}] window shown with nobody to answer it; closing it\n", form.Name());
+  std::fflush(stderr);
+  if (form.Showing()) form.Close();
+  if (form.Showing()) form.Hide();
 }
 
 }  // namespace forms

@@ -12,6 +12,9 @@ class ConsoleDesktop : public Desktop {
   int MsgBox(const MessageBox& box) override;
   std::string InputBox(const InputRequest& request) override;
   void DoEvents() override {}
+  // Nobody can act on a window here: a form waited on is closed as its close box
+  // would close it, and hidden if it refuses, so the caller never waits forever.
+  void WaitWhileVisible(Form& form) override;
 };
 
 }  // namespace forms

@@ -4,6 +4,7 @@
 #include <span>
 
 #include "platform/forms/ConsoleDesktop.h"
+#include "platform/forms/Form.h"
 
 namespace forms {
 
@@ -73,6 +74,15 @@ Desktop& Desktop::Current() {
 void Desktop::Install(std::shared_ptr<Desktop> desktop) { InstalledSlot() = std::move(desktop); }
 
 std::shared_ptr<Desktop> Desktop::Installed() { return InstalledSlot(); }
+
+void Desktop::ShowModal(Form& form) {
+  form.Display(true);
+  WaitWhileVisible(form);
+}
+
+void Desktop::WaitWhileVisible(Form& form) {
+  while (form.Showing()) DoEvents();
+}
 
 int MsgBox(const std::string& prompt, int style, const std::string& title) {
   MessageBox box{prompt, title.empty() ? ApplicationTitle() : title, style};

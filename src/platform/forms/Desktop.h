@@ -4,10 +4,14 @@
 // bringing windows to the front. Three implementations stand behind it: the Qt desktop
 // (real windows), the scripted desktop (tests) and the automation driver (JSON lines).
 
+#include <cstdint>
 #include <memory>
 #include <string>
 
 namespace forms {
+
+class Form;
+class Menu;
 
 // MsgBox styles and answers, numbered as Basic numbers them.
 enum MsgBoxStyle : int {
@@ -76,6 +80,24 @@ class Desktop {
   virtual std::string InputBox(const InputRequest& request) = 0;
   // Lets pending window messages run.
   virtual void DoEvents() = 0;
+
+  // The screen's size in twips (1920 x 1080 pixels unless a desktop knows better).
+  virtual int32_t ScreenWidth() const { return 1920 * 15; }
+  virtual int32_t ScreenHeight() const { return 1080 * 15; }
+
+  // Shows a form modally and returns when it is hidden or unloaded. By default: put
+  // it on screen and wait while it is visible.
+  virtual void ShowModal(Form& form);
+  // Lets window messages run until the form is no longer visible (the loop of a
+  // dialog shown modeless and waited on).
+  virtual void WaitWhileVisible(Form& form);
+  // A form's mouse pointer changed (vbHourglass, vbDefault).
+  virtual void MousePointerChanged(Form& form, int pointer) {}
+  // A form's place in the z-order changed (HWND_TOPMOST, HWND_NOTOPMOST, HWND_TOP).
+  virtual void WindowOrderChanged(Form& form, int32_t insertAfter) {}
+  // Shows a pop-up menu and returns the item chosen, or null when it was dismissed.
+  // Only a visible, enabled item that is no separator may be returned.
+  virtual Menu* ShowPopupMenu(Form& form, Menu& menu, float x, float y) { return nullptr; }
 
   // The desktop of this process. Until a host installs one, a console desktop answers
   // every box with its default button and writes it to standard error.
