@@ -1,6 +1,7 @@
 #include "platform/ado/SqlTranslator.h"
 
 #include <array>
+#include <cctype>
 #include <vector>
 
 #include "platform/ado/ServerDate.h"
@@ -44,8 +45,10 @@ class Output {
   void Add(std::string_view piece) {
     if (piece.empty()) return;
     char first = piece.front();
-    bool tight = text_.empty() || first == ',' || first == ')' || first == '.' ||
-                 text_.back() == '(' || text_.back() == '.';
+    char last = text_.empty() ? ' ' : text_.back();
+    bool callOrName = first == '(' && (std::isalnum(static_cast<unsigned char>(last)) || last == '_');
+    bool tight = text_.empty() || first == ',' || first == ')' || first == '.' || callOrName ||
+                 last == '(' || last == '.';
     if (!tight) text_ += ' ';
     text_ += piece;
   }

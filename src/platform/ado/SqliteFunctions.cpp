@@ -4,6 +4,7 @@
 
 #include <cmath>
 #include <cstdlib>
+#include <cstring>
 #include <string>
 
 #include "platform/ado/Collation.h"
@@ -97,29 +98,42 @@ void Plus(sqlite3_context* ctx, int, sqlite3_value** argv) {
   sqlite3_result_double(ctx, a + b);
 }
 
+// SQLite's aggregate memory is only 8-byte aligned, so the 128-bit totals are kept as
+// bytes and copied in and out.
 struct MoneySum {
   bool any = false;
   bool fractional = false;
-  __int128 whole = 0;       // sum while every addend is whole
-  __int128 tenThousandths = 0;
+  unsigned char whole[16];           // sum while every addend is whole
+  unsigned char tenThousandths[16];  // every addend in ten-thousandths
+
+  static __int128 Load(const unsigned char* at) {
+    __int128 v;
+    std::memcpy(&v, at, sizeof v);
+    return v;
+  }
+  static void Add(unsigned char* at, __int128 delta) {
+    __int128 v = Load(at) + delta;
+    std::memcpy(at, &v, sizeof v);
+  }
 };
 
 void SumStep(sqlite3_context* ctx, int, sqlite3_value** argv) {
   int type = sqlite3_value_numeric_type(argv[0]);
   if (type == SQLITE_NULL) return;
+  // The context comes zero-filled, which is a valid empty sum.
   auto* acc = static_cast<MoneySum*>(sqlite3_aggregate_context(ctx, sizeof(MoneySum)));
   if (!acc) return sqlite3_result_error_nomem(ctx);
   acc->any = true;
   if (type == SQLITE_INTEGER) {
     long long n = sqlite3_value_int64(argv[0]);
-    acc->whole += n;
-    acc->tenThousandths += static_cast<__int128>(n) * 10000;
+    MoneySum::Add(acc->whole, n);
+    MoneySum::Add(acc->tenThousandths, static_cast<__int128>(n) * 10000);
   } else {
     double d = sqlite3_value_double(argv[0]);
     if (!std::isfinite(d) || std::fabs(d) > 9.2e14)
       return sqlite3_result_error(ctx, "Arithmetic overflow error converting expression to data type numeric.", -1);
     acc->fractional = true;
-    acc->tenThousandths += static_cast<__int128>(std::llround(d * 10000.0));
+    MoneySum::Add(acc->tenThousandths, static_cast<__int128>(std::llround(d * 10000.0)));
   }
 }
 
@@ -127,11 +141,12 @@ void SumFinal(sqlite3_context* ctx) {
   auto* acc = static_cast<MoneySum*>(sqlite3_aggregate_context(ctx, 0));
   if (!acc || !acc->any) return sqlite3_result_null(ctx);
   if (!acc->fractional) {
-    if (acc->whole > INT64_MAX || acc->whole < INT64_MIN)
+    __int128 whole = MoneySum::Load(acc->whole);
+    if (whole > INT64_MAX || whole < INT64_MIN)
       return sqlite3_result_error(ctx, "Arithmetic overflow error converting expression to data type bigint.", -1);
-    return sqlite3_result_int64(ctx, static_cast<long long>(acc->whole));
+    return sqlite3_result_int64(ctx, static_cast<long long>(whole));
   }
-  sqlite3_result_double(ctx, static_cast<double>(acc->tenThousandths) / 10000.0);
+  sqlite3_result_double(ctx, static_cast<double>(MoneySum::Load(acc->tenThousandths)) / 10000.0);
 }
 
 void DateTime(sqlite3_context* ctx, int, sqlite3_value** argv) {
