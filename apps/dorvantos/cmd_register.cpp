@@ -5,6 +5,7 @@
 #include <limits.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <string>
 #include <vector>
@@ -41,10 +42,13 @@ std::vector<std::string> Libraries(const Args& args) {
 }
 
 std::string ProgIdList(const std::vector<automation::ClassEntry>& classes) {
+  std::vector<std::string> names;
+  for (const auto& entry : classes) names.push_back(entry.progId.empty() ? entry.clsid : entry.progId);
+  std::sort(names.begin(), names.end());
   std::string list;
-  for (const auto& entry : classes) {
+  for (const std::string& name : names) {
     if (!list.empty()) list += ", ";
-    list += entry.progId.empty() ? entry.clsid : entry.progId;
+    list += name;
   }
   return list.empty() ? std::string("no classes") : list;
 }

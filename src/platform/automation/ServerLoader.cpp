@@ -41,7 +41,9 @@ std::shared_ptr<const LoadedServer> Load(const std::string& path) {
   void* handle = dlopen(path.c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
   if (handle == nullptr) {
     const char* why = dlerror();
-    throw ServerLoadError(fmt::format("cannot load {}: {}", path, why ? why : "unknown reason"));
+    // The loader's own text already names the file.
+    throw ServerLoadError(why ? fmt::format("cannot load {}", why)
+                              : fmt::format("cannot load {}: unknown reason", path));
   }
   auto server = std::make_shared<LoadedServer>();
   server->path = path;
