@@ -12,5 +12,6 @@ using Args = std::vector<std::string>;
 int RunReg(const Args& args);         // reg query|add|delete|import|export
 int RunRegister(const Args& args);    // register [LIBRARY...]
 int RunUnregister(const Args& args);  // unregister [LIBRARY...]
+int RunUser(const Args& args);        // user add NAME [--password TEXT] [--db PATH]
 
 }  // namespace app
