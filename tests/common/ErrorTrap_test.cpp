@@ -15,72 +15,52 @@ namespace {
 
 using common::TrapSite;
 
+// Each kind of procedure with what its reports must look like: whether an empty and a
+// blank description are reported, and whether the message is the long form.
 struct Case {
   const char* kind;
   TrapSite site;
+  bool reportsEmpty;
+  bool reportsBlank;
+  bool longForm;
 };
 
 std::vector<Case> AllKinds() {
   return {
-      {"Login", common::LoginSite("Login")},
-      {"DataEnvironment", common::DataEnvironmentSite("SqlServer_WillExecute")},
-      {"Class", common::ClassSite("NovoRegisto")},
-      {"Form", common::FormSite("frmMain", "DoGravar")},
-      {"FindConta", common::FindContaSite("DoFillConta")},
-      {"ControlFill", common::ControlFillSite()},
-      {"Registry", common::RegistrySite("ObterValorString")},
-      {"Fechos", common::FechosSite("IsClosedDate")},
-      {"Code", common::CodeSite("Trtf")},
-      {"Data", common::DataSite("ListField")},
+      {"Login", common::LoginSite("Login"), true, true, false},
+      {"DataEnvironment", common::DataEnvironmentSite("SqlServer_WillExecute"), true, true, false},
+      {"Class", common::ClassSite("NovoRegisto"), false, true, false},
+      {"Form", common::FormSite("frmMain", "DoGravar"), false, false, false},
+      {"FindConta", common::FindContaSite("DoFillConta"), false, false, false},
+      {"ControlFill", common::ControlFillSite(), false, false, false},
+      {"Registry", common::RegistrySite("ObterValorString"), false, false, true},
+      {"Fechos", common::FechosSite("IsClosedDate"), false, false, true},
+      {"Code", common::CodeSite("Trtf"), false, false, true},
+      {"Data", common::DataSite("ListField"), false, false, true},
   };
 }
 
-TEST(ErrorTrapRules, WhichErrorsAreReportedDependsOnTheKindOfProcedure) {
+TEST(ErrorTrapRules, WhichErrorsAreReportedAndHowDependsOnTheKindOfProcedure) {
   for (const Case& c : AllKinds()) {
     SCOPED_TRACE(c.kind);
-    const bool always = c.site.rule == common::TrapRule::Always;
-    const bool nonEmpty = c.site.rule == common::TrapRule::NonEmpty;
     EXPECT_FALSE(common::ShouldReport(c.site, 0, "anything"));
     EXPECT_FALSE(common::ShouldReport(c.site, 3709, "closed"));
     EXPECT_TRUE(common::ShouldReport(c.site, 5, "x"));
-    EXPECT_EQ(common::ShouldReport(c.site, 5, ""), always);
-    EXPECT_EQ(common::ShouldReport(c.site, 5, "   "), always || nonEmpty);
-  }
-  EXPECT_EQ(common::LoginSite("Login").rule, common::TrapRule::Always);
-  EXPECT_EQ(common::DataEnvironmentSite("SqlServer_WillExecute").rule, common::TrapRule::Always);
-  EXPECT_EQ(common::ClassSite("Registo").rule, common::TrapRule::NonEmpty);
-}
-
-TEST(ErrorTrapRules, ModulesOfTheLongFormSayTheNumber) {
-  for (const Case& c : AllKinds()) {
-    SCOPED_TRACE(c.kind);
-    std::string message = common::ReportMessage(c.site, 13, "Type mismatch");
-    if (c.site.longMessage) {
-      EXPECT_EQ(message, "Error Number = 13 | Description = Type mismatch");
-    } else {
-      EXPECT_EQ(message, "Type mismatch");
-    }
-  }
-  for (const TrapSite& site : {common::RegistrySite("x"), common::FechosSite("x"),
-                               common::CodeSite("x"), common::DataSite("x")}) {
-    EXPECT_TRUE(site.longMessage) << site.module;
+    EXPECT_EQ(common::ShouldReport(c.site, 5, ""), c.reportsEmpty);
+    EXPECT_EQ(common::ShouldReport(c.site, 5, "   "), c.reportsBlank);
+    EXPECT_EQ(common::ReportMessage(c.site, 13, "Type mismatch"),
+              c.longForm ? "Error Number = 13 | Description = Type mismatch" : "Type mismatch");
   }
 }
 
-TEST(ErrorTrapRules, LabelsTheReportsCarry) {
+TEST(ErrorTrapRules, LabelsQuotedForTheReporter) {
   TrapSite controlFill = common::ControlFillSite();
-  EXPECT_EQ(controlFill.product, "ControlFill");
-  EXPECT_EQ(controlFill.project, "ControlFill");
-  EXPECT_EQ(controlFill.module, "modControlFill");
+  EXPECT_EQ(controlFill.product + "|" + controlFill.project + "|" + controlFill.module,
+            "ControlFill|ControlFill|modControlFill");
   EXPECT_EQ(common::RegistrySite("GravarValorString").product, "Módulo de Registo");
-  EXPECT_EQ(common::RegistrySite("GravarValorString").module, "modRegistry");
   EXPECT_EQ(common::FormSite("frmMainDetails", "DoGravar").project, "Dorvantos");
-  EXPECT_EQ(common::FormSite("frmMainDetails", "DoGravar").module, "frmMainDetails");
   EXPECT_EQ(common::FindContaSite("Form_Load").project, "Cordavel");
-  EXPECT_EQ(common::FindContaSite("Form_Load").module, "frmFindConta");
-  EXPECT_EQ(common::LoginSite("Login").module, "General");
   EXPECT_EQ(common::DataEnvironmentSite("SqlServer_WillExecute").module, "DataEnvironment");
-  EXPECT_EQ(common::ClassSite("Registo").module, "General");
   // The classes report under two different fixed pairs.
   EXPECT_NE(common::LoginSite("Login").project, common::ClassSite("Login").project);
 }

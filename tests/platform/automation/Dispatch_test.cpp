@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <stdexcept>
-
 #include "platform/vb/Conversions.h"
 #include "platform/vb/Error.h"
 
@@ -104,12 +102,6 @@ TEST(Dispatch, CallsThatDoNotFitRaiseBasicErrors) {
   } catch (const vb::Error& e) {
     EXPECT_NE(e.Description().find("Withdraw"), std::string::npos) << e.Description();
   }
-}
-
-TEST(Dispatch, TableRefusesAMemberDeclaredTwice) {
-  automation::MemberTable<Account> table;
-  table.Method("Describe", {0, 0}, [](Account&, Args&) { return Variant(); });
-  EXPECT_THROW(table.Property("describe", [](Account&) { return Variant(); }), std::logic_error);
 }
 
 TEST(Dispatch, TypedParametersConvertAsAutomationDoes) {
