@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <random>
+
 #include "platform/registry/RegText.h"
 #include "platform/registry/Registry.h"
 #include "platform/registry/Store.h"
@@ -138,6 +140,34 @@ TEST(RegText, MalformedTextNamesTheLine) {
       ADD_FAILURE() << "accepted: " << c.text;
     } catch (const StoreError& e) {
       EXPECT_NE(std::string(e.what()).find(c.where), std::string::npos) << e.what();
+    }
+  }
+}
+
+TEST(RegText, DamagedTextEitherReadsOrFailsCleanly) {
+  Hive hive;
+  Key& key = hive.Create("HKEY_LOCAL_MACHINE\\SOFTWARE\\Quorvex\\POC");
+  key.Set("dtUser", {REG_SZ, "sa \"x\" \\"});
+  key.Set("Lines", {REG_SZ, "a\nb"});
+  key.Set("Blob", {REG_BINARY, std::string(60, '\x5a')});
+  key.Set("N", {REG_DWORD, "\1\2\3\4"});
+  const std::string text = WriteRegText(hive);
+  std::mt19937 random(20240601);
+  const char alphabet[] = "\"\\[]-=@:,()\n\r ;hexdword0123456789abcdefHKEY_\xff\xfe\x00";
+  for (int round = 0; round < 3000; ++round) {
+    std::string damaged = text;
+    for (int edits = 1 + static_cast<int>(random() % 4); edits > 0; --edits) {
+      size_t at = random() % (damaged.size() + 1);
+      switch (random() % 3) {
+        case 0: damaged.insert(at, 1, alphabet[random() % (sizeof alphabet - 1)]); break;
+        case 1: if (at < damaged.size()) damaged.erase(at, 1 + random() % 8); break;
+        default: damaged.resize(at); break;
+      }
+    }
+    try {
+      Hive back = ParseRegText(damaged);
+      EXPECT_EQ(ParseRegText(WriteRegText(back)), back);  // whatever reads, writes back the same
+    } catch (const StoreError&) {
     }
   }
 }
