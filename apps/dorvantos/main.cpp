@@ -24,7 +24,9 @@ constexpr const char* kUsage =
     "  reg add PATH NAME VALUE    write a string value (creates the key)\n"
     "  reg delete PATH [NAME]     delete a value, or a key with everything below it\n"
     "  reg import FILE            merge a .reg file into the settings store\n"
-    "  reg export PATH FILE       write a key and everything below it to a .reg file\n";
+    "  reg export PATH FILE       write a key and everything below it to a .reg file\n"
+    "  user add NAME [--password TEXT] [--db PATH]\n"
+    "                             add or change a database login of the embedded engine\n";
 
 int Usage() {
   std::fputs(kUsage, stderr);
@@ -52,6 +54,7 @@ int main(int argc, char** argv) {
       {"register", app::RunRegister},
       {"unregister", app::RunUnregister},
       {"reg", app::RunReg},
+      {"user", app::RunUser},
   };
   const auto it = verbs.find(verb);
   if (it == verbs.end()) return Usage();
