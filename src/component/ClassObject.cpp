@@ -1,6 +1,10 @@
 #include "component/ClassObject.h"
 
+#include <optional>
+
 #include "common/ErrorTrap.h"
+#include "common/PasswordCodec.h"
+#include "component/Data.h"
 #include "component/LoginState.h"
 
 namespace component {
@@ -43,11 +47,50 @@ const automation::MemberTable<ClassObject>& ClassObject::Members() {
 bool ClassObject::Login(std::string& User, std::string& Password) {
   bool result = false;
   common::Trap(common::LoginSite("Login"), [&] {
-    // A login is put in place only once the database has accepted the host's user; the
-    // data environment that asks it is not part of the component yet, so no login
-    // succeeds and the answer stays false.
+    DataEnvironment& data = Data();
+    if (IsLoggedIn() && data.SqlServer()->State() == ado::adStateOpen) {
+      result = true;
+      return;
+    }
+    std::optional<ConnectionSettings> settings = ReadConnectionSettings();
+    if (!settings) return;
+    settings_ = *settings;
+    // Both passwords arrive encoded; one that does not decode cannot log anybody in.
+    std::optional<std::string> storedPassword = common::DecodePassword(settings_.password);
+    std::optional<std::string> userPassword = common::DecodePassword(Password);
+    if (!storedPassword || !userPassword) return;
+    result = LoginWith(data, User, Password, *userPassword, *storedPassword);
   });
   return result;
+}
+
+bool ClassObject::LoginWith(DataEnvironment& data, const std::string& user,
+                            const std::string& encodedPassword, const std::string& userPassword,
+                            const std::string& storedPassword) {
+  // The host's user must be a login the database accepts; a private connection asks,
+  // so the shared one keeps its own login. From here on errors are answers, not reports.
+  ado::ConnectionPtr probe = ado::Connection::Create();
+  try {
+    probe->Open(ConnectionString(settings_, user, userPassword));
+  } catch (const std::exception&) {
+    return false;
+  }
+  RecordLoggedUser(user, encodedPassword);
+  const ado::ConnectionPtr& shared = data.SqlServer();
+  if (shared->State() != ado::adStateOpen) {
+    try {
+      shared->SetConnectionString(ConnectionString(settings_, settings_.user, storedPassword));
+      shared->Open();
+    } catch (const std::exception&) {
+      // The next statement finds it closed and offers to try again.
+    }
+  }
+  SetLoggedIn();
+  try {
+    probe->Close();
+  } catch (const std::exception&) {
+  }
+  return true;
 }
 
 void ClassObject::NovoRegisto(std::string& Table, const vb::Variant& Pkey, int32_t Contacto_ID,

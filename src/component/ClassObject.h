@@ -11,11 +11,14 @@
 #include <cstdint>
 #include <string>
 
+#include "component/ConnectionSettings.h"
 #include "platform/automation/Dispatch.h"
 #include "platform/automation/InprocServer.h"
 #include "platform/vb/Variant.h"
 
 namespace component {
+
+class DataEnvironment;
 
 // The live class objects of the component, which DllCanUnloadNow answers from.
 automation::ObjectCounter& LiveObjects();
@@ -34,6 +37,13 @@ class ClassObject : public automation::Dispatch<ClassObject> {
                        const std::string& StrWhere, const vb::ObjectPtr& Caller) = 0;
 
  private:
+  // Login's steps once the settings are read and both passwords decoded.
+  bool LoginWith(DataEnvironment& data, const std::string& user,
+                 const std::string& encodedPassword, const std::string& userPassword,
+                 const std::string& storedPassword);
+
+  // The settings the last Login of this object read.
+  ConnectionSettings settings_;
   automation::ObjectCounter::ObjectLock alive_{LiveObjects()};
 };
 
