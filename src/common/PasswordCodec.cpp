@@ -60,6 +60,8 @@ std::optional<std::string> Unbase64(std::string_view text) {
   if (text.back() == '=') ++padding;
   if (text.size() > 1 && text[text.size() - 2] == '=') ++padding;
   out.resize(static_cast<size_t>(n) - padding);
+  // Only the one spelling: bits the padding leaves over must not hide a change.
+  if (Base64(out) != text) return std::nullopt;
   return out;
 }
 
