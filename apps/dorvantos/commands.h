@@ -13,5 +13,8 @@ int RunReg(const Args& args);         // reg query|add|delete|import|export
 int RunRegister(const Args& args);    // register [LIBRARY...]
 int RunUnregister(const Args& args);  // unregister [LIBRARY...]
 int RunUser(const Args& args);        // user add NAME [--password TEXT] [--db PATH]
+int RunSetupDemo(const Args& args);   // setup-demo [--db PATH] [--registry PATH] [--user NAME]
+                                      //            [--password TEXT] [--force]
+int RunEncodePassword(const Args& args);  // encode-password TEXT
 
 }  // namespace app

@@ -26,7 +26,11 @@ constexpr const char* kUsage =
     "  reg import FILE            merge a .reg file into the settings store\n"
     "  reg export PATH FILE       write a key and everything below it to a .reg file\n"
     "  user add NAME [--password TEXT] [--db PATH]\n"
-    "                             add or change a database login of the embedded engine\n";
+    "                             add or change a database login of the embedded engine\n"
+    "  setup-demo [--db PATH] [--registry PATH] [--user NAME] [--password TEXT] [--force]\n"
+    "                             create the demo database, its logins and the settings,\n"
+    "                             and register the component\n"
+    "  encode-password TEXT       print a password in the form Login and the settings take\n";
 
 int Usage() {
   std::fputs(kUsage, stderr);
@@ -55,6 +59,8 @@ int main(int argc, char** argv) {
       {"unregister", app::RunUnregister},
       {"reg", app::RunReg},
       {"user", app::RunUser},
+      {"setup-demo", app::RunSetupDemo},
+      {"encode-password", app::RunEncodePassword},
   };
   const auto it = verbs.find(verb);
   if (it == verbs.end()) return Usage();
