@@ -21,4 +21,9 @@ Variant Object::Call(const std::string& name, std::vector<Variant> args) {
   return Invoke(name, args);
 }
 
+Variant Object::Call(const std::string& name) {
+  std::vector<Variant> none;
+  return Invoke(name, none);
+}
+
 }  // namespace vb

@@ -23,7 +23,8 @@ class Object : public std::enable_shared_from_this<Object> {
   virtual void Let(const std::string& name, const Variant& value);
 
   // Convenience for callers that pass arguments by value.
-  Variant Call(const std::string& name, std::vector<Variant> args = {});
+  Variant Call(const std::string& name, std::vector<Variant> args);
+  Variant Call(const std::string& name);
 };
 
 using ObjectPtr = std::shared_ptr<Object>;
