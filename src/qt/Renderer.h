@@ -1,0 +1,74 @@
+#pragma once
+// Follows the form model and keeps one window per loaded form in step with it. Every
+// input a window takes runs through RunInput, which keeps Qt's focus on the model's
+// focused control afterwards and disposes of the windows of forms unloaded meanwhile
+// once no handler of theirs is on the stack.
+
+#include <QEventLoop>
+#include <functional>
+#include <memory>
+#include <unordered_map>
+#include <vector>
+
+#include "platform/forms/FormListener.h"
+#include "qt/Twips.h"
+
+namespace forms {
+class Form;
+class Control;
+}  // namespace forms
+
+namespace dvqt {
+
+class FormWindow;
+
+class Renderer : public forms::FormListener {
+ public:
+  explicit Renderer(TwipsScale scale);
+  ~Renderer() override;
+  Renderer(const Renderer&) = delete;
+  Renderer& operator=(const Renderer&) = delete;
+
+  const TwipsScale& scale() const { return scale_; }
+  // The window of a loaded form; null for a form not loaded.
+  FormWindow* WindowOf(const forms::Form& form) const;
+
+  // Runs a person's action on a form's model. Errors are logged, not thrown.
+  void RunInput(forms::Form& form, const std::function<void()>& action);
+  void MirrorFocus(forms::Form& form);
+  // Rebuilds every collection whose rebuild is still pending.
+  void FlushAll();
+
+  // Event loops waiting for a form to leave the screen (modal display).
+  void AddWaiter(const forms::Form& form, QEventLoop* loop);
+  void RemoveWaiter(const forms::Form& form, QEventLoop* loop);
+  // Told after a form's window went with its unload.
+  std::function<void(const forms::Form&)> onUnloaded;
+
+  void FormLoaded(forms::Form& form) override;
+  void FormShown(forms::Form& form, bool modal) override;
+  void FormHidden(forms::Form& form) override;
+  void FormUnloaded(forms::Form& form) override;
+  void FormChanged(forms::Form& form, std::string_view property) override;
+  void ControlChanged(forms::Control& control, std::string_view property) override;
+  void ItemChanged(forms::Control& control, std::string_view key,
+                   std::string_view property) override;
+  void FocusChanged(forms::Form& form, forms::Control* focused) override;
+
+ private:
+  FormWindow* EnsureWindow(forms::Form& form);
+  void StopWaiters(const forms::Form& form);
+  void Reap();
+
+  TwipsScale scale_;
+  std::unordered_map<const forms::Form*, std::unique_ptr<FormWindow>> windows_;
+  std::vector<std::unique_ptr<FormWindow>> retired_;
+  std::unordered_multimap<const forms::Form*, QEventLoop*> waiters_;
+  int depth_ = 0;
+};
+
+// Whether the form object is still one the model lists as loaded: a window never
+// touches a form that was destroyed under it.
+bool IsLoadedForm(const forms::Form* form);
+
+}  // namespace dvqt
