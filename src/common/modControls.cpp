@@ -82,7 +82,7 @@ std::string TypedRawValue(const std::string& text) {
 }
 
 // What a text box or a label shows for a value: the raw value for its tag and its
-// text. An empty optional leaves that part as it was.
+// text. What is left empty stays as it was.
 struct Shown {
   std::optional<std::string> tag;
   std::optional<std::string> text;
