@@ -16,5 +16,6 @@ int RunUser(const Args& args);        // user add NAME [--password TEXT] [--db P
 int RunSetupDemo(const Args& args);   // setup-demo [--db PATH] [--registry PATH] [--user NAME]
                                       //            [--password TEXT] [--force]
 int RunEncodePassword(const Args& args);  // encode-password TEXT
+int RunAutomate(const Args& args);        // automate [--registry PATH]
 
 }  // namespace app

@@ -30,7 +30,8 @@ constexpr const char* kUsage =
     "  setup-demo [--db PATH] [--registry PATH] [--user NAME] [--password TEXT] [--force]\n"
     "                             create the demo database, its logins and the settings,\n"
     "                             and register the component\n"
-    "  encode-password TEXT       print a password in the form Login and the settings take\n";
+    "  encode-password TEXT       print a password in the form Login and the settings take\n"
+    "  automate [--registry PATH] drive the component with JSON lines on stdin and stdout\n";
 
 int Usage() {
   std::fputs(kUsage, stderr);
@@ -61,6 +62,7 @@ int main(int argc, char** argv) {
       {"user", app::RunUser},
       {"setup-demo", app::RunSetupDemo},
       {"encode-password", app::RunEncodePassword},
+      {"automate", app::RunAutomate},
   };
   const auto it = verbs.find(verb);
   if (it == verbs.end()) return Usage();
