@@ -22,7 +22,7 @@ namespace app {
 namespace {
 
 // The servers that ship beside the executable, in ../lib.
-const char* const kDefaultServers[] = {"libpoc_dorvantos.so", "libravelport.so"};
+const char* const kDefaultServers[] = {"libpoc_dorvantos.so", "libravelport.so", "librecordfinder.so"};
 
 std::string ExecutableDirectory() {
   char path[PATH_MAX];
