@@ -103,9 +103,11 @@ int QtDesktop::MsgBox(const forms::MessageBox& box) {
   dialog.setDefaultButton(ButtonFor(box.DefaultAnswer()));
   int escape = EscapeAnswer(box);
   if (escape != 0) dialog.setEscapeButton(ButtonFor(escape));
+  // QMessageBox re-parents itself when its modality is set, which resets its flags: the
+  // modality comes first.
+  dialog.setWindowModality(Qt::ApplicationModal);
   // A system-modal box (the security refusals) stays above every window.
   if (box.SystemModal()) dialog.setWindowFlag(Qt::WindowStaysOnTopHint, true);
-  dialog.setWindowModality(Qt::ApplicationModal);
   ArrowOverDialog arrow(*this);
   dialog.exec();
   QAbstractButton* clicked = dialog.clickedButton();
