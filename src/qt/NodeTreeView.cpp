@@ -42,6 +42,8 @@ NodeTreeView::NodeTreeView(FormWindow& window, forms::TreeView& tree)
   tree_->setExpandsOnDoubleClick(false);
   tree_->setEditTriggers(QAbstractItemView::NoEditTriggers);
   tree_->setSelectionMode(QAbstractItemView::SingleSelection);
+  // Long names widen the tree with a scroll bar rather than being cut short.
+  tree_->header()->setStretchLastSection(false);
   tree_->header()->setSectionResizeMode(QHeaderView::ResizeToContents);
   Watch(tree_->viewport());
   QObject::connect(tree_, &QTreeWidget::itemExpanded, this, [this](QTreeWidgetItem* row) { Toggled(row); });
