@@ -4,6 +4,7 @@
 
 #include <fmt/format.h>
 
+#include "platform/automation/ClassObjects.h"
 #include "platform/automation/ClassRegistry.h"
 #include "platform/automation/ServerLoader.h"
 #include "platform/vb/Error.h"
@@ -25,6 +26,22 @@ std::string Failure(HRESULT hr) {
 }  // namespace
 
 vb::ObjectPtr CreateObject(const std::string& progId) {
+  if (!IsValidProgID(progId)) CannotCreate(progId, fmt::format("\"{}\" is no ProgID", progId));
+  // A class this process serves itself comes before the class registry.
+  if (ClassObjectFactory factory = FindClassObject(progId)) {
+    vb::ObjectPtr object;
+    try {
+      object = factory();
+    } catch (const std::exception& e) {
+      CannotCreate(progId, fmt::format("{} could not make an instance: {}", progId, e.what()));
+    }
+    if (!object) CannotCreate(progId, fmt::format("{} could not make an instance", progId));
+    return object;
+  }
+  return CreateRegisteredObject(progId);
+}
+
+vb::ObjectPtr CreateRegisteredObject(const std::string& progId) {
   if (!IsValidProgID(progId)) CannotCreate(progId, fmt::format("\"{}\" is no ProgID", progId));
 
   std::optional<std::string> clsid = CLSIDFromProgID(progId);
