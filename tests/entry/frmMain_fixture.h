@@ -161,8 +161,8 @@ class HeaderEditorTest : public ::testing::Test {
   }
   // An entry made by someone, as other windows or modules leave them.
   int32_t AddEntry(const std::string& columns = "", const std::string& values = "") {
-    Execute("INSERT INTO tbPOC_Dorvantos (data, created_by, valor, finalizado" + columns +
-            ") VALUES (CONVERT(DATETIME,'2024-05-10 09:15:00',102), 'ana', 0, 0" + values + ")");
+    Execute("INSERT INTO tbPOC_Dorvantos (data, created_by, valor" + columns +
+            ") VALUES (CONVERT(DATETIME,'2024-05-10 09:15:00',102), 'ana', 0" + values + ")");
     return LastId();
   }
   int32_t AddLine(int32_t entry, const std::string& debito, const std::string& credito,

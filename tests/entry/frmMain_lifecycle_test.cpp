@@ -175,6 +175,7 @@ TEST_F(HeaderEditorTest, SavingIntoAClosedPeriodIsRefusedWithoutWriting) {
 
 TEST_F(HeaderEditorTest, SavingWithoutAnEntryOrWhenTheDatabaseFailsSaysSo) {
   form->Load();
+  form->FXData.SetValue(vb::Now());
   EXPECT_FALSE(form->DoGravar());
   ASSERT_EQ(desktop->messages.size(), 1u);
   EXPECT_EQ(desktop->messages[0].text, "Não foi possível gravar as alterações.");
@@ -192,7 +193,7 @@ TEST_F(HeaderEditorTest, SavingWithoutAnEntryOrWhenTheDatabaseFailsSaysSo) {
   ASSERT_EQ(desktop->messages.size(), 2u);
   EXPECT_EQ(desktop->messages[1].text.rfind("Erro: Não foi possível gravar as alterações. ", 0), 0u);
   EXPECT_EQ(desktop->messages[1].style, forms::vbOKOnly);
-  EXPECT_EQ(desktop->messages[1].title, "");
+  EXPECT_EQ(desktop->messages[1].title, forms::ApplicationTitle());
   EXPECT_NE(TakeErrors().find("frmMain.DoGravar"), std::string::npos);
   EXPECT_EQ(vb::CStr(Scalar("SELECT obs FROM tbPOC_Dorvantos WHERE dorvanto_id = " + std::to_string(id))),
             "escrito");
