@@ -7,28 +7,6 @@ namespace {
 
 using forms::KeyboardUser;
 
-std::vector<std::string> Captions(forms::Toolbar& bar) {
-  std::vector<std::string> captions;
-  for (int32_t i = 1; i <= bar.Buttons().Count(); ++i) captions.push_back(bar.Buttons()(i).Key() + "=" + bar.Buttons()(i).Caption());
-  return captions;
-}
-
-TEST_F(HeaderEditorTest, TheCommandsCarryTheirExactCaptions) {
-  EXPECT_EQ(form->Caption(), "Lançamento no Diário");
-  EXPECT_EQ(Captions(form->Toolbar1),
-            (std::vector<std::string>{"fechar=&Fechar Janela     ", "gravar=&Gravar                ",
-                                      "finalizar=&Finalizar              ", "apagar=&Apagar Registo  "}));
-  EXPECT_EQ(Captions(form->Toolbar2),
-            (std::vector<std::string>{"novo=&Novo (F2)   ", "abrir=&Abrir           ", "remover=&Remover    ",
-                                      "importar=&Importar     ", "predefinidos=&Predefinidos"}));
-  std::vector<std::string> menu;
-  for (forms::Menu* item : form->mnFicheiro.Items()) menu.push_back(item->Name() + "=" + item->Caption());
-  EXPECT_EQ(menu, (std::vector<std::string>{"mnAbrir=&Abrir", "mnNovo=&Novo (F2)", "mnBar1=-",
-                                            "mnRemover=&Remover", "mnBar2=-", "mnImportar=&Importar",
-                                            "mnPredefinidos=&Predefinidos"}));
-  EXPECT_EQ(form->ListView1.ColumnHeaders().Count(), 10);
-}
-
 TEST_F(HeaderEditorTest, LoadingCoversTheScreenFillsTheListsAndSpreadsTheLayout) {
   const int32_t designToolbarLeft = form->Toolbar1.Design().left;
   const int32_t designWidth = 12000;
