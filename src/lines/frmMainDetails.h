@@ -144,8 +144,8 @@ class frmMainDetails : public forms::Form {
 
   bool NovaLinha = false;
   bool Finalizado = false;
-  // Leave-validation moves the focus itself when it fills a field; the move runs the
-  // validation again, which must then let the focus go.
+  // While a code is validated on leaving its field, filling the field does not move
+  // the focus: the person's own move (a click on OK, say) must not be taken over.
   bool validatingConta_ = false;
   bool validatingSubconta_ = false;
   // The account finder lives while it is open; it calls DoFillConta back on this form.

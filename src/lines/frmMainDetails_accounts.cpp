@@ -69,7 +69,9 @@ void frmMainDetails::DoFillConta(int32_t& ID) {
     FXConta.SetText(TextOrEmpty(rs->Fields("descrit").Value()));
     FXConta_Codigo.SetText(TextOrEmpty(rs->Fields("codigo").Value()));
     rs->Close();
-    FocusIfShown(FXSubconta_codigo);
+    // A person leaving the field goes where they chose; only a pick from the finder
+    // or a key moves them on.
+    if (!validatingConta_) FocusIfShown(FXSubconta_codigo);
   });
 }
 
@@ -93,13 +95,11 @@ void frmMainDetails::DoFillSubConta(int32_t& ID) {
       FXConta.SetTag(vb::CStr(rs->Fields("conta_id").Value()));
     }
     rs->Close();
-    FocusIfShown(FXDescrit_ID);
+    if (!validatingSubconta_) FocusIfShown(FXDescrit_ID);
   });
 }
 
 void frmMainDetails::FXConta_Codigo_Validate(int& Cancel) {
-  // Filling the account moves the focus on, which asks this validation again.
-  if (validatingConta_) return;
   Busy busy(validatingConta_);
   common::Trap(Site("FXConta_Codigo_Validate"), [&] {
     if (!Command1.Visible()) return;
@@ -121,7 +121,6 @@ void frmMainDetails::FXConta_Codigo_Validate(int& Cancel) {
 }
 
 void frmMainDetails::FXSubconta_codigo_Validate(int& Cancel) {
-  if (validatingSubconta_) return;
   Busy busy(validatingSubconta_);
   common::Trap(Site("FXSubconta_codigo_Validate"), [&] {
     if (!Command1.Visible()) return;
