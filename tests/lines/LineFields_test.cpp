@@ -216,3 +216,36 @@ TEST_F(LinesTest, PickerListsCodesRefusesEditingAndSortsByTheClickedColumn) {
 }
 
 }  // namespace
+
+namespace {
+
+forms::Form* LoadedForm(const std::string& name) {
+  for (forms::Form* form : forms::LoadedForms())
+    if (form->Name() == name) return form;
+  return nullptr;
+}
+
+using dvtest::LinesTest;
+
+TEST_F(LinesTest, AccountFinderHandsItsPickBackAndClosesWithTheEditor) {
+  auto editor = InsertLine(NewEntry());
+  forms::KeyboardUser(*editor).Focus(editor->FXConta_Codigo);
+  forms::KeyboardUser(*editor).Press(forms::vbKeyAdd);
+  EXPECT_EQ(editor->FXConta_Codigo.Text(), "");  // the plus is not typed into the code
+  forms::Form* finder = LoadedForm("frmFindConta");
+  ASSERT_NE(finder, nullptr);
+  EXPECT_TRUE(finder->Showing());
+  EXPECT_EQ(editor->MousePointer(), forms::vbDefault);
+
+  forms::KeyboardUser(*finder).DoubleClickNode(finder->Ctl<forms::TreeView>("TreeView1"), "#12");
+  EXPECT_EQ(editor->FXConta_Codigo.Text(), "12");
+  EXPECT_EQ(editor->FXConta.Text(), "Depósitos à ordem");
+  EXPECT_EQ(editor->ActiveControl(), &editor->FXSubconta_codigo);
+
+  editor->DoProcurarConta();
+  ASSERT_NE(LoadedForm("frmFindConta"), nullptr);
+  editor->Command2_Click();
+  EXPECT_EQ(LoadedForm("frmFindConta"), nullptr);
+}
+
+}  // namespace
