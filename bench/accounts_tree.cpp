@@ -38,8 +38,9 @@ std::vector<std::string> GeneratedCodes(int accounts, bool skipLevel) {
 }
 
 std::string CreateChart(int accounts, bool skipLevel) {
-  auto path = std::filesystem::temp_directory_path() /
-              ("dv-bench-accounts-" + std::to_string(::getpid()) + (skipLevel ? "-skip" : "") + ".db");
+  const std::string name = "dv-bench-accounts-" + std::to_string(::getpid()) +
+                           (skipLevel ? "-skip" : "") + ".db";
+  auto path = std::filesystem::temp_directory_path() / name;
   ado::CreateOptions options;
   options.demoData = false;
   options.replaceExisting = true;
@@ -51,9 +52,10 @@ std::string CreateChart(int accounts, bool skipLevel) {
   conn->BeginTrans();
   const std::vector<std::string> codes = GeneratedCodes(accounts, skipLevel);
   for (size_t i = 0; i < codes.size(); ++i) {
-    conn->Execute("INSERT INTO tbPOC_Contas (codigo, descrit, conta_activo, atribuicao) VALUES ('" +
-                  codes[i] + "', 'Conta " + codes[i] + "', " + (i % 7 ? "NULL" : "'21'") + ", " +
-                  std::to_string(i % 2) + ")");
+    conn->Execute(
+        "INSERT INTO tbPOC_Contas (codigo, descrit, conta_activo, atribuicao) VALUES ('" +
+        codes[i] + "', 'Conta " + codes[i] + "', " + (i % 7 ? "NULL" : "'21'") + ", " +
+        std::to_string(i % 2) + ")");
   }
   conn->CommitTrans();
   conn->Close();
