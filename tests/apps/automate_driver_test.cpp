@@ -178,6 +178,48 @@ TEST_F(AutomateTest, MistakesGetAnErrorAndTheDriverGoesOn) {
   EXPECT_EQ(driver.Wait(), 0);
 }
 
+// The shared connection's stored password is wrong, so Login opens only the user's own
+// connection, and the first statement of the component finds the shared one closed.
+TEST_F(AutomateTest, TheReconnectDialogIsWorkedAsAModalWindow) {
+  RegisterComponent();
+  CreateDatabaseAndSettings("errada");
+  DriverProcess driver = Start();
+  ASSERT_TRUE(driver.Started());
+  EXPECT_EQ(driver.Request({{"op", "login"}, {"class", "General"}, {"user", "demo"},
+                            {"password", "demo"}})
+                .response,
+            (Json{{"ok", true}, {"result", true}}));
+
+  driver.Send(Json{{"op", "new"}, {"class", "General"}});
+  Json first = driver.Read();
+  if (first == Ok()) GTEST_SKIP() << "NovoRegisto runs no statement yet";
+  EXPECT_EQ(first, (Json{{"event", "modal"}, {"form", "frmSQLServer"}, {"instance", 1}}));
+  auto dialog = driver.Request({{"op", "state"}, {"form", "frmSQLServer"}});
+  EXPECT_EQ(dialog.response["caption"], "Ligação ao Servidor de Dados (SQL)");
+  EXPECT_EQ(dialog.response["controls"]["Command1"]["caption"], "&Ligar ao servidor SQL");
+  EXPECT_EQ(dialog.response["controls"]["Label2(0)"]["caption"],
+            "Possivelmente o servidor SQL está desligado ou inacessível.");
+
+  // Still refused: the dialog comes back, as a new window of its own.
+  driver.Send(Json{{"op", "click"}, {"form", "frmSQLServer"}, {"control", "Command1"}});
+  EXPECT_EQ(driver.Read()["ok"], true);
+  EXPECT_EQ(driver.Read(), (Json{{"event", "modal"}, {"form", "frmSQLServer"}, {"instance", 2}}));
+
+  // Put right meanwhile: the next try connects and NovoRegisto goes on to its answer.
+  registry::Store(Registry()).Update([](registry::Hive& hive) {
+    hive.Find("HKEY_LOCAL_MACHINE\\SOFTWARE\\Quorvex\\POC")
+        ->Set("dtPassword", {registry::REG_SZ, common::EncodePassword("partilhada")});
+  });
+  driver.Send(Json{{"op", "click"}, {"form", "frmSQLServer"}, {"control", "Command1"}});
+  EXPECT_EQ(driver.Read()["ok"], true);
+  DriverProcess::Reply rest = driver.ReadReply();
+  EXPECT_EQ(rest.response, Ok());
+  for (const Json& event : rest.events) EXPECT_NE(event["event"], "modal") << event;
+
+  driver.CloseInput();
+  EXPECT_EQ(driver.Wait(), 0);
+}
+
 // ---- the stand-in: boxes, modal windows, menus, reports, call-backs ---------------------
 
 TEST_F(AutomateTest, AMessageBoxWaitsForAnAnswerThatItOffers) {
