@@ -92,15 +92,21 @@ std::string RandomPassword() {
 }
 
 void CreateDemoDatabase(const SetupOptions& options, const std::string& sharedPassword) {
-  std::filesystem::path folder = std::filesystem::path(options.db).parent_path();
-  if (!folder.empty()) {
-    std::filesystem::create_directories(folder);
+  namespace fs = std::filesystem;
+  fs::path folder = fs::path(options.db).parent_path();
+  // A folder made here is private; one that exists is the person's choice.
+  if (!folder.empty() && !fs::exists(folder)) {
+    fs::create_directories(folder);
+    fs::permissions(folder, fs::perms::owner_all, fs::perm_options::replace);
   }
   ado::CreateOptions create;
   create.demoData = true;
   create.replaceExisting = options.force;
   ado::CreateDatabase(options.db,
                       {{kSharedLogin, sharedPassword}, {options.user, options.password}}, create);
+  // The ledger and the login hashes are its owner's alone, like the settings file.
+  fs::permissions(options.db, fs::perms::owner_read | fs::perms::owner_write,
+                  fs::perm_options::replace);
 }
 
 // The five values the component's Login reads, in one write: a host never sees half

@@ -67,6 +67,9 @@ TEST_F(SetupDemoTest, TheDemoUserLogsInThroughTheComponentCreatedByProgId) {
   struct stat settings {};
   ASSERT_EQ(stat(registry::Store::DefaultPath().c_str(), &settings), 0);
   EXPECT_EQ(settings.st_mode & 0777, 0600u);
+  struct stat database {};
+  ASSERT_EQ(stat(db_.c_str(), &database), 0);
+  EXPECT_EQ(database.st_mode & 0777, 0600u);
 
   Outcome encoded = Command("encode-password demo");
   ASSERT_EQ(encoded.status, 0) << encoded.output;
