@@ -199,8 +199,12 @@ void frmMainDetails::FXSubconta_Find_ButtonClick(forms::ToolbarButton&) { DoProc
 void frmMainDetails::DoProcurarConta() {
   common::Trap(Site("DoProcurarConta"), [&] {
     WaitCursor wait(*this);
-    if (std::shared_ptr<forms::Form> previous = std::move(accountFinder_); previous && previous->Loaded())
+    // A finder still open from an earlier search is closed first; it must forget this
+    // editor before it goes, or leaving it without a pick would close the editor too.
+    if (std::shared_ptr<forms::Form> previous = std::move(accountFinder_); previous && previous->Loaded()) {
+      previous->Let("MainForm", vb::Nothing());
       previous->Unload();
+    }
     std::shared_ptr<forms::Form> finder = accounts::NewAccountFinder();
     finder->Let("MainForm", vb::Variant(shared_from_this()));
     accountFinder_ = finder;

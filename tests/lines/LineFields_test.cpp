@@ -248,4 +248,18 @@ TEST_F(LinesTest, AccountFinderHandsItsPickBackAndClosesWithTheEditor) {
   EXPECT_EQ(LoadedForm("frmFindConta"), nullptr);
 }
 
+TEST_F(LinesTest, SearchingAgainReplacesTheOpenFinderAndKeepsTheEditor) {
+  auto editor = InsertLine(NewEntry());
+  editor->DoProcurarConta();
+  forms::Form* first = LoadedForm("frmFindConta");
+  ASSERT_NE(first, nullptr);
+  editor->DoProcurarConta();
+  // The first finder went without a pick; it must not take the editor with it.
+  EXPECT_TRUE(editor->Showing());
+  forms::Form* second = LoadedForm("frmFindConta");
+  ASSERT_NE(second, nullptr);
+  forms::KeyboardUser(*second).DoubleClickNode(second->Ctl<forms::TreeView>("TreeView1"), "#12");
+  EXPECT_EQ(editor->FXConta_Codigo.Text(), "12");
+}
+
 }  // namespace
