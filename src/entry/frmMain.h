@@ -50,7 +50,9 @@ class frmMain : public forms::Form {
   explicit frmMain(HeaderEditorWindows windows);
 
   // Public state, set by the classes that open the window.
-  vb::ObjectPtr MainClass;
+  // The class object owns this window; holding it back weakly keeps the pair from
+  // keeping each other alive once the host lets go.
+  std::weak_ptr<vb::Object> MainClass;
   vb::ObjectPtr CallBackClass;
   int32_t Dorvanto_ID = 0;
   int32_t Diario_ID = 0;
@@ -65,6 +67,12 @@ class frmMain : public forms::Form {
   void DoFillContador();
   void DoInsertDorvanto();
   void RemoteKey(int32_t ID);
+
+  // Finalizing an open entry, or offering to reopen a final one. True when the entry
+  // was finalized, was final (whatever the answer to reopening) or is gone.
+  bool DoFinalizar();
+  // Attaches a series number to a final system document; also the label's click.
+  void FXRelated_ID_DblClick();
 
   // The lines list and the look of the window.
   void DoFillDorvantos(int32_t ID = 0);
@@ -159,6 +167,16 @@ class frmMain : public forms::Form {
   void PaintLinesArea(bool editable);
   void PaintHeaderFields(bool editable);
 
+  // Finalizing helpers.
+  forms::ToolbarButton& FinalizeButton() { return Toolbar1.Buttons()("finalizar"); }
+  bool FinalizeOpenEntry();
+  void NumberLine(const vb::Variant& diarioId);
+  void AskReopen();
+
+  // Header field helpers.
+  void CheckDocumentNumber();
+  void HeaderFieldKey(int KeyCode);
+
   // Shell helpers.
   vb::ObjectPtr NewDetailsForm();
   int32_t SelectedLineKey();
@@ -177,6 +195,12 @@ class frmMain : public forms::Form {
   void mnAbrir_Click();
   void mnNovo_Click();
   void mnRemover_Click();
+  void HeaderField_KeyDown(const char* procedure, int KeyCode);
+  void FXDorvanto_No_KeyDown(int& KeyCode, int Shift);
+  void FXDorvanto_No_LostFocus();
+  void FXTipo_Diario_ID_KeyDown(int& KeyCode, int Shift);
+  void FXRelated_ID_Label_Click();
+  void Image1_DblClick();
 
   HeaderEditorWindows windows_;
   FormLayout layout_;

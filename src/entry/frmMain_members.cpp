@@ -47,6 +47,25 @@ void frmMain::BindHandlers() {
   FXRelated_ID.Change = [this] { MarkUnsaved(); };
   FXTipo.Click = [this] { MarkUnsaved(); };
   FXTipo_Diario_ID.Click = [this] { MarkUnsaved(); };
+
+  // F2 and F3 work in every header field; the key still reaches the field.
+  FXCreated_By.KeyDown = [this](int& KeyCode, int) { HeaderField_KeyDown("FXCreated_By_KeyDown", KeyCode); };
+  FXData.KeyDown = [this](int& KeyCode, int) { HeaderField_KeyDown("FXData_KeyDown", KeyCode); };
+  FXObs.KeyDown = [this](int& KeyCode, int) { HeaderField_KeyDown("FXObs_KeyDown", KeyCode); };
+  FXReferencia.KeyDown = [this](int& KeyCode, int) { HeaderField_KeyDown("FXReferencia_KeyDown", KeyCode); };
+  FXTipo_ID.KeyDown = [this](int& KeyCode, int) { HeaderField_KeyDown("FXTipo_ID_KeyDown", KeyCode); };
+  FXTotal_Creditos.KeyDown = [this](int& KeyCode, int) {
+    HeaderField_KeyDown("FXTotal_Creditos_KeyDown", KeyCode);
+  };
+  FXTotal_Debitos.KeyDown = [this](int& KeyCode, int) {
+    HeaderField_KeyDown("FXTotal_Debitos_KeyDown", KeyCode);
+  };
+  Handle(FXDorvanto_No.KeyDown, &frmMain::FXDorvanto_No_KeyDown);
+  Handle(FXDorvanto_No.LostFocus, &frmMain::FXDorvanto_No_LostFocus);
+  Handle(FXTipo_Diario_ID.KeyDown, &frmMain::FXTipo_Diario_ID_KeyDown);
+  Handle(FXRelated_ID.DblClick, &frmMain::FXRelated_ID_DblClick);
+  Handle(FXRelated_ID_Label.Click, &frmMain::FXRelated_ID_Label_Click);
+  Handle(Image1.DblClick, &frmMain::Image1_DblClick);
 }
 
 void frmMain::PublishMembers() {
@@ -66,13 +85,14 @@ void frmMain::PublishMembers() {
     DoInsertDorvanto();
     return vb::Variant();
   });
+  Method("DoFinalizar", [this](std::vector<vb::Variant>&) { return vb::Variant(DoFinalizar()); });
   Method("RemoteKey", [this](std::vector<vb::Variant>& args) {
     RemoteKey(LongArgument(args, 0));
     return vb::Variant();
   });
 
   Property(
-      "MainClass", [this] { return vb::Variant(MainClass); },
+      "MainClass", [this] { return vb::Variant(MainClass.lock()); },
       [this](const vb::Variant& value) { MainClass = automation::ObjectArg(value); });
   Property(
       "CallBackClass", [this] { return vb::Variant(CallBackClass); },

@@ -71,17 +71,21 @@ class Recorder : public vb::Object {
   bool failing = false;
 };
 
-// frmMain with the finalization it calls by name answered by the test.
+// frmMain whose finalization, called by name, is answered by the test unless the test
+// asks for the real one.
 class TestMain : public frmMain {
  public:
   explicit TestMain(HeaderEditorWindows windows) : frmMain(std::move(windows)) {
     Method("DoFinalizar", [this](std::vector<vb::Variant>&) {
       ++finalizations;
-      return vb::Variant(finalizeAnswer);
+      return vb::Variant(realFinalize ? DoFinalizar() : finalizeAnswer);
     });
   }
+  bool realFinalize = false;
   bool finalizeAnswer = true;
   int finalizations = 0;
+  bool Final() const { return Finalizado; }
+  bool Unlocked() const { return Desbloqueado; }
 
   // What the system-document password does.
   void Unlock() {
