@@ -289,7 +289,7 @@ void frmMain::DoRestart() {
     if (!vb::CBool(Call("DoFinalizar"))) return;
     Hide();
     RestartForm = windows_.HeaderEditor();
-    RestartForm->Let("MainClass", vb::Variant(MainClass));
+    RestartForm->Let("MainClass", vb::Variant(MainClass.lock()));
     RestartForm->Let("CallBackClass", vb::Variant(CallBackClass));
     RestartForm->Call("DoInsert");
     forms::DoEvents();

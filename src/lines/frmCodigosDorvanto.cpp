@@ -19,8 +19,8 @@ frmCodigosDorvanto::frmCodigosDorvanto() : Form(Design()) {
   Handle(ListView1.DblClick, &frmCodigosDorvanto::ListView1_DblClick);
   Handle(ListView1.KeyDown, &frmCodigosDorvanto::ListView1_KeyDown);
   Property(
-      "MainForm", [this] { return MainForm ? vb::Variant(MainForm) : vb::Variant(); },
-      [this](const vb::Variant& value) { MainForm = value.IsObject() ? value.AsObject() : nullptr; });
+      "MainForm", [this] { return vb::Variant(MainForm.lock()); },
+      [this](const vb::Variant& value) { MainForm = value.IsObject() ? value.AsObject() : vb::ObjectPtr(); });
   Property("Cancelar", [this] { return vb::Variant(Cancelar); });
 }
 

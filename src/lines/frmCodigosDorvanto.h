@@ -18,7 +18,8 @@ class frmCodigosDorvanto : public forms::Form {
   frmCodigosDorvanto();
 
   // The form that opened the picker; the picker itself does not use it.
-  vb::ObjectPtr MainForm;
+  // The opener; held weakly, as the opener keeps its picker.
+  std::weak_ptr<vb::Object> MainForm;
   // Set when the person left with "Cancelar"; false whenever the picker opens.
   bool Cancelar = false;
 

@@ -81,9 +81,9 @@ void frmMainDetails::BindEvents() {
 
 void frmMainDetails::PublishMembers() {
   Property(
-      "MainClass", [this] { return MainClass ? vb::Variant(MainClass) : vb::Variant(); },
+      "MainClass", [this] { return vb::Variant(MainClass.lock()); },
       [this](const vb::Variant& value) {
-        MainClass = value.IsObject() ? value.AsObject() : nullptr;
+        MainClass = value.IsObject() ? value.AsObject() : vb::ObjectPtr();
       });
   Property(
       "Diario_ID", [this] { return vb::Variant(Diario_ID); },

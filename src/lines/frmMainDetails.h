@@ -37,7 +37,8 @@ class frmMainDetails : public forms::Form {
   frmMainDetails();
 
   // The header editor that opened this one; without it OK makes no call-backs.
-  vb::ObjectPtr MainClass;
+  // Held weakly: the header editor keeps the line editor it opened last.
+  std::weak_ptr<vb::Object> MainClass;
   int32_t Diario_ID = 0;
   int32_t Dorvanto_ID = 0;
 

@@ -127,7 +127,7 @@ void frmMainDetails::Command1_Click() {
     if (!Command1.Visible()) return;
     if (!DoGravar()) return;
     Hide();
-    if (Diario_ID != 0 && MainClass) NotifyHeaderEditor();
+    if (Diario_ID != 0 && !MainClass.expired()) NotifyHeaderEditor();
     Unload();
   });
 }
@@ -137,12 +137,14 @@ void frmMainDetails::Command1_Click() {
 // this editor closes all the same.
 void frmMainDetails::NotifyHeaderEditor() {
   try {
+    const vb::ObjectPtr header = MainClass.lock();
+    if (!header) return;
     std::vector<vb::Variant> args{vb::Variant(Diario_ID)};
-    MainClass->Invoke("DoFillDorvantos", args);
+    header->Invoke("DoFillDorvantos", args);
     auto total = [&](const char* name) {
-      return vb::CStr(MainClass->Get(name).AsObject()->Get("Text"));
+      return vb::CStr(header->Get(name).AsObject()->Get("Text"));
     };
-    if (total("FXTotal_Creditos") != total("FXTotal_Debitos")) MainClass->Call("DoInsertDorvanto");
+    if (total("FXTotal_Creditos") != total("FXTotal_Debitos")) header->Call("DoInsertDorvanto");
   } catch (const std::exception&) {
   }
 }

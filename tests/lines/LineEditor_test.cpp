@@ -198,7 +198,7 @@ TEST_F(LinesTest, OkAsksForTheNextLineOnlyWhileTheTotalsDiffer) {
   }
   // Without a header editor there is nobody to call, and OK still closes.
   auto alone = InsertLine(entry);
-  alone->MainClass = nullptr;
+  alone->MainClass.reset();
   int32_t subconta = SubContaId("11001");
   alone->DoFillSubConta(subconta);
   alone->FXCredito.SetTag("10");
