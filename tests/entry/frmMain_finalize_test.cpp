@@ -316,7 +316,7 @@ TEST_F(FinalizeTest, RestartFinalizesForRealAndMovesOnFromAFinalEntryWhateverThe
 // Two processes finalize entries of the same database at the same moment, each on its
 // own connection: every line gets its own number and no number is skipped.
 TEST_F(FinalizeTest, ConcurrentFinalizationsNeverShareOrSkipANumber) {
-  constexpr int kEntriesEach = 4;
+  constexpr int kEntriesEach = 10;
   constexpr int kLinesEach = 3;
   SetCounter("reg_no", 100);
   std::vector<std::vector<int32_t>> entries(2);
