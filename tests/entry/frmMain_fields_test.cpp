@@ -212,16 +212,5 @@ TEST_F(FieldsTest, OnlyTheExactPasswordUnlocksASystemDocument) {
   EXPECT_EQ(desktop->inputs.size(), 3u);
 }
 
-TEST_F(FieldsTest, AnUnlockedOrdinaryEntryOfAnotherUserCanBeRemoved) {
-  const int32_t id = AddEntry();
-  Execute("UPDATE tbPOC_Dorvantos SET created_by = 'rui' WHERE dorvanto_id = " + Id(id));
-  Open(id);
-  desktop->QueueInput("tolmarequinhoza");
-  ASSERT_TRUE(user().DoubleClick(form->Image1));
-  desktop->QueueAnswer(forms::vbYes);
-  form->DoRemove(id);
-  EXPECT_TRUE(Scalar("SELECT dorvanto_id FROM tbPOC_Dorvantos WHERE dorvanto_id = " + Id(id)).IsNull());
-}
-
 }  // namespace
 }  // namespace entry::testing
