@@ -6,6 +6,7 @@
 #include "common/PasswordCodec.h"
 #include "component/Data.h"
 #include "component/LoginState.h"
+#include "entry/HeaderEditor.h"
 
 namespace component {
 
@@ -98,7 +99,20 @@ void ClassObject::NovoRegisto(std::string& Table, const vb::Variant& Pkey, int32
   common::Trap(common::ClassSite("NovoRegisto"), [&] {
     if (!IsLoggedIn()) return;
     // Table, Pkey and Contacto_ID do not change what a new entry is.
+    HeaderEditorFor(Caller).Call("DoInsert");
   });
+}
+
+vb::Object& ClassObject::HeaderEditorFor(const vb::ObjectPtr& Caller) {
+  if (!headerEditor_) headerEditor_ = entry::NewHeaderEditor();
+  headerEditor_->Let("MainClass", vb::Variant(shared_from_this()));
+  headerEditor_->Let("CallBackClass", vb::Variant(Caller));
+  return *headerEditor_;
+}
+
+void ClassObject::OpenInHeaderEditor(const vb::ObjectPtr& Caller, int32_t dorvantoId,
+                                     int32_t diarioId) {
+  HeaderEditorFor(Caller).Call("DoOpen", {vb::Variant(dorvantoId), vb::Variant(diarioId)});
 }
 
 }  // namespace component

@@ -9,6 +9,7 @@
 //           [Caller As Object])
 
 #include <cstdint>
+#include <memory>
 #include <string>
 
 #include "component/ConnectionSettings.h"
@@ -36,6 +37,13 @@ class ClassObject : public automation::Dispatch<ClassObject> {
   virtual void Registo(vb::Variant& tRs, const vb::Variant& Pkey, const std::string& Tabela,
                        const std::string& StrWhere, const vb::ObjectPtr& Caller) = 0;
 
+ protected:
+  // The object's one header editor, created on first use and reused by every later
+  // NovoRegisto or Registo, with MainClass and CallBackClass set for this call.
+  vb::Object& HeaderEditorFor(const vb::ObjectPtr& Caller);
+  // Opens the entry (and selects the line) in the header editor.
+  void OpenInHeaderEditor(const vb::ObjectPtr& Caller, int32_t dorvantoId, int32_t diarioId);
+
  private:
   // Login's steps once the settings are read and both passwords decoded.
   bool LoginWith(DataEnvironment& data, const std::string& user,
@@ -44,6 +52,7 @@ class ClassObject : public automation::Dispatch<ClassObject> {
 
   // The settings the last Login of this object read.
   ConnectionSettings settings_;
+  std::shared_ptr<vb::Object> headerEditor_;
   automation::ObjectCounter::ObjectLock alive_{LiveObjects()};
 };
 
