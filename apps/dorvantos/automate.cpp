@@ -33,6 +33,7 @@
 #include <fmt/format.h>
 
 #include "automate_state.h"
+#include "host_database.h"
 #include "automate_windows.h"
 #include "commands.h"
 #include "common/PasswordCodec.h"
@@ -55,7 +56,6 @@ namespace automate {
 namespace {
 
 constexpr const char* kUsage = "usage: dorvantos automate [--registry PATH]\n";
-constexpr const char* kSettingsKey = "HKEY_LOCAL_MACHINE\\SOFTWARE\\Quorvex\\POC";
 constexpr const char* kReporterProgId = "Ravelport.General";
 
 // A request that cannot be carried out. Its message is the response's error; `extra`
@@ -435,28 +435,11 @@ vb::ObjectPtr Driver::ClassObject(const std::string& name) {
 
 ado::ConnectionPtr Driver::Database() {
   if (database_ && database_->State() == ado::adStateOpen) return database_;
-  auto setting = [](const char* name) {
-    vb::Variant value = common::ObterValorString(kSettingsKey, name);
-    if (!value.IsString())
-      throw RequestError(fmt::format("the setting {} is missing under {}", name, kSettingsKey));
-    return value.AsString();
-  };
-  std::string securityInfo = setting("dtSecurityInfo");
-  std::string user = setting("dtUser");
-  std::optional<std::string> password = common::DecodePassword(setting("dtPassword"));
-  if (!password) throw RequestError("the setting dtPassword is not an encoded password");
-  std::string catalog = setting("dtInitialCatalog");
-  std::string server = setting("dtDataSource");
-  auto connection = ado::Connection::Create();
-  // Every value quoted as needed: a setting must not add keys of its own.
-  connection->Open(ado::BuildConnectionString({{"Provider", "SQLOLEDB.1"},
-                                               {"Persist Security Info", securityInfo},
-                                               {"User ID", user},
-                                               {"Password", *password},
-                                               {"Initial Catalog", catalog},
-                                               {"Data Source", server},
-                                               {"Connect Timeout", "15"}}));
-  database_ = connection;
+  try {
+    database_ = app::OpenSettingsDatabase();
+  } catch (const app::SettingsError& e) {
+    throw RequestError(e.what());
+  }
   return database_;
 }
 

@@ -9,6 +9,7 @@ namespace app {
 
 using Args = std::vector<std::string>;
 
+int RunEditor(const Args& args);     // [--user U] [--password P] [--open ID | --line ID]
 int RunReg(const Args& args);         // reg query|add|delete|import|export
 int RunRegister(const Args& args);    // register [LIBRARY...]
 int RunUnregister(const Args& args);  // unregister [LIBRARY...]

@@ -14,7 +14,11 @@
 namespace {
 
 constexpr const char* kUsage =
-    "usage: dorvantos [--registry FILE] VERB [ARGS...]\n"
+    "usage: dorvantos [--registry FILE] [--user NAME] [--password TEXT] [--open ID | --line ID]\n"
+    "       dorvantos [--registry FILE] VERB [ARGS...]\n"
+    "\n"
+    "Without a verb, opens the journal editor on a new entry (--open: an entry; --line: the\n"
+    "entry of a line), logged in as NAME (default: the demo login).\n"
     "\n"
     "verbs:\n"
     "  --version                  print the version\n"
@@ -47,7 +51,10 @@ int main(int argc, char** argv) {
     registry::Store::SetDefaultPath(args[1]);
     args.erase(args.begin(), args.begin() + 2);
   }
-  if (args.empty()) return Usage();
+  // No verb, or only the editor's options: the journal editor in real windows.
+  const bool editorOption = !args.empty() && args[0].rfind("--", 0) == 0 &&
+                            args[0] != "--version" && args[0] != "--help";
+  if (args.empty() || editorOption) return app::RunEditor(args);
 
   const std::string verb = args[0];
   const app::Args rest(args.begin() + 1, args.end());
