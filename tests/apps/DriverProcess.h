@@ -28,6 +28,12 @@ inline std::string BinDirectory() {
   return std::filesystem::canonical("/proc/self/exe").parent_path().string();
 }
 
+// The build's lib/ directory, where the component and its peers are.
+inline std::string LibDirectory() {
+  if (const char* lib = std::getenv("POC_TEST_LIB"); lib && *lib) return lib;
+  return (std::filesystem::path(BinDirectory()).parent_path() / "lib").string();
+}
+
 class DriverProcess {
  public:
   using Json = nlohmann::json;

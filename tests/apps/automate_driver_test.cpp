@@ -19,11 +19,7 @@ namespace {
 
 using Json = nlohmann::json;
 using dvtest::DriverProcess;
-
-std::string LibDirectory() {
-  if (const char* lib = std::getenv("POC_TEST_LIB"); lib && *lib) return lib;
-  return (std::filesystem::path(dvtest::BinDirectory()).parent_path() / "lib").string();
-}
+using dvtest::LibDirectory;
 
 class AutomateTest : public ::testing::Test {
  protected:
