@@ -121,6 +121,9 @@ void frmMainDetails::DoOpen(int32_t& p_Diario_ID) {
 }
 
 void frmMainDetails::Command1_Click() {
+  // The header editor, told of the line, may open the next line editor in this one's
+  // place and drop the last reference to it: stay alive until the handler is done.
+  const vb::ObjectPtr self = shared_from_this();
   common::Trap(Site("Command1_Click"), [&] {
     // OK is hidden for a line of a final entry; the keys that save must not reach
     // around it and write to a closed entry.
