@@ -1,6 +1,6 @@
-// The journal editor in real windows: the host loads the component by ProgID, logs the
-// person in and opens a new entry, an entry, or the entry of a line, then runs the
-// desktop until the last window closes.
+// The journal in real windows: the host loads the component by ProgID, logs the person
+// in and shows its list of entries (or opens an entry, or the entry of a line, at
+// once), then runs the desktop until the last window closes.
 
 #include <fmt/format.h>
 
@@ -9,6 +9,7 @@
 #include <string>
 
 #include "commands.h"
+#include "editor_list.h"
 #include "common/PasswordCodec.h"
 #include "host_database.h"
 #include "platform/ado/RecordsetObject.h"
@@ -50,20 +51,22 @@ std::optional<EditorOptions> ParseEditorOptions(const Args& args) {
   return options;
 }
 
-// Opens what the options ask for in the class's header editor.
-void OpenEditor(vb::Object& component, const EditorOptions& options) {
+// Opens what the options ask for: the list of entries, or one entry in the class's
+// header editor. Returns the list window, which must outlive the desktop's run.
+std::shared_ptr<frmDiario> OpenEditor(const vb::ObjectPtr& component, const EditorOptions& options) {
   if (!options.entry && !options.line) {
-    component.Call("NovoRegisto", {vb::Variant("tbPOC_Dorvantos"), vb::Variant::Missing(),
-                                   vb::Variant::Missing(), vb::Nothing()});
-    return;
+    auto list = std::make_shared<frmDiario>(OpenSettingsDatabase(), component);
+    list->Show();
+    return list;
   }
   // As a host does: its own recordset of the table, handed over with the key.
   const char* query = options.entry ? "SELECT * FROM tbPOC_Dorvantos ORDER BY dorvanto_id"
                                     : "SELECT * FROM tbPOC_Dorvantos_Details ORDER BY diario_id";
   ado::RecordsetPtr records = OpenSettingsDatabase()->Execute(query);
-  component.Call("Registo", {ado::RecordsetObject::Wrap(records),
-                             vb::Variant(options.entry ? *options.entry : *options.line),
-                             vb::Variant::Missing(), vb::Variant::Missing(), vb::Nothing()});
+  component->Call("Registo", {ado::RecordsetObject::Wrap(records),
+                              vb::Variant(options.entry ? *options.entry : *options.line),
+                              vb::Variant::Missing(), vb::Variant::Missing(), vb::Nothing()});
+  return nullptr;
 }
 
 }  // namespace
@@ -91,7 +94,7 @@ int RunEditor(const Args& args) {
                     forms::vbCritical);
       return 1;
     }
-    OpenEditor(*component, *options);
+    const std::shared_ptr<frmDiario> list = OpenEditor(component, *options);
     forms::RunGraphicalDesktop();
     return 0;
   } catch (const std::exception& e) {
