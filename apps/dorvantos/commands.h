@@ -18,5 +18,6 @@ int RunSetupDemo(const Args& args);   // setup-demo [--db PATH] [--registry PATH
                                       //            [--password TEXT] [--force]
 int RunEncodePassword(const Args& args);  // encode-password TEXT
 int RunAutomate(const Args& args);        // automate [--registry PATH]
+int RunDemo(const Args& args);            // demo [--user NAME] [--password TEXT]
 
 }  // namespace app

@@ -17,8 +17,8 @@ constexpr const char* kUsage =
     "usage: dorvantos [--registry FILE] [--user NAME] [--password TEXT] [--open ID | --line ID]\n"
     "       dorvantos [--registry FILE] VERB [ARGS...]\n"
     "\n"
-    "Without a verb, opens the journal editor on a new entry (--open: an entry; --line: the\n"
-    "entry of a line), logged in as NAME (default: the demo login).\n"
+    "Without a verb, opens the list of the journal's entries (--open: an entry; --line: the\n"
+    "entry of a line, in the editor at once), logged in as NAME (default: the demo login).\n"
     "\n"
     "verbs:\n"
     "  --version                  print the version\n"
@@ -35,7 +35,10 @@ constexpr const char* kUsage =
     "                             create the demo database, its logins and the settings,\n"
     "                             and register the component\n"
     "  encode-password TEXT       print a password in the form Login and the settings take\n"
-    "  automate [--registry PATH] drive the component with JSON lines on stdin and stdout\n";
+    "  automate [--registry PATH] drive the component with JSON lines on stdin and stdout\n"
+    "  demo [--user NAME] [--password TEXT]\n"
+    "                             keep one entry through the windows without a display and\n"
+    "                             print each step and the journal\n";
 
 int Usage() {
   std::fputs(kUsage, stderr);
@@ -70,6 +73,7 @@ int main(int argc, char** argv) {
       {"setup-demo", app::RunSetupDemo},
       {"encode-password", app::RunEncodePassword},
       {"automate", app::RunAutomate},
+      {"demo", app::RunDemo},
   };
   const auto it = verbs.find(verb);
   if (it == verbs.end()) return Usage();
