@@ -41,7 +41,8 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS "${CMAKE_BINARY_DIR}/lib")
 # with libqt6gui6, the others (Wayland among them) are welcome but not needed.
 set(CPACK_DEBIAN_PACKAGE_DEPENDS "fonts-dejavu-core")
 set(CPACK_DEBIAN_PACKAGE_RECOMMENDS "qt6-qpa-plugins")
-# No maintainer scripts: the menu and icon caches follow /usr/share through their own
-# triggers, and the libraries are found through the RPATH, not the linker cache.
+# No maintainer scripts of ours: the menu and icon caches follow /usr/share through their
+# own triggers, and the libraries are found through the RPATH (CPack's ldconfig calls,
+# added for anything in /usr/lib, are harmless).
 
 include(CPack)
