@@ -1,7 +1,8 @@
 // The design of the header editor: the heading, the window toolbar at the top right,
 // the header fields in three columns inside Frame1, the notes, and inside Frame2 the
 // lines toolbar, the lines list and the totals, with the journal-type counter below.
-// Positions in twips; the resize pass (modLayout) moves them from here.
+// Positions in twips; a control inside a frame counts its Left and Top from the
+// frame's corner. The resize pass (modLayout) moves them from here.
 
 #include <string>
 
@@ -20,12 +21,12 @@ constexpr int32_t kFormHeight = 8760;
 
 constexpr int32_t kFieldHeight = 315;
 constexpr int32_t kLabelHeight = 240;
-// The three columns of the header; FXTipo spans the first two.
-constexpr int32_t kColumn1 = 240, kColumn1Width = 3360;
-constexpr int32_t kColumn2 = 3840, kColumn2Width = 3360;
-constexpr int32_t kColumn3 = 7440, kColumn3Width = 4200;
-// Each header row is a caption above its field.
-constexpr int32_t kRow1 = 840, kRow2 = 1500, kRow3 = 2160;
+// The three columns of the header inside Frame1; FXTipo spans the first two.
+constexpr int32_t kColumn1 = 120, kColumn1Width = 3360;
+constexpr int32_t kColumn2 = 3720, kColumn2Width = 3360;
+constexpr int32_t kColumn3 = 7320, kColumn3Width = 4200;
+// Each header row is a caption above its field, counted from Frame1's top.
+constexpr int32_t kRow1 = 180, kRow2 = 840, kRow3 = 1500;
 constexpr int32_t kFieldBelowCaption = 240;
 
 std::string Padded(const char* caption, int blanks) { return caption + std::string(blanks, ' '); }
@@ -73,8 +74,8 @@ forms::FormDesign frmMain::Design() {
            .height = 480, .caption = "accessories-text-editor"},
           {.name = "Label1", .type = ControlType::Label, .left = 720, .top = 210, .width = 3600,
            .height = 360, .caption = "Lançamento", .properties = {{"FontBold", true}}},
-          {.name = "Toolbar1", .type = ControlType::Toolbar, .left = 6360, .top = 120,
-           .width = 5520, .height = 420,
+          {.name = "Toolbar1", .type = ControlType::Toolbar, .left = 4200, .top = 120,
+           .width = 7440, .height = 420,
            .items = {{.key = "fechar", .caption = Padded("&Fechar Janela", 5)},
                      {.key = "gravar", .caption = Padded("&Gravar", 16)},
                      {.key = "finalizar", .caption = kFinalizarCaption},
@@ -82,7 +83,7 @@ forms::FormDesign frmMain::Design() {
 
           // The header, column by column as the tab order runs.
           {.name = "Frame1", .type = ControlType::Frame, .left = 120, .top = 660,
-           .width = 11760, .height = 2220},
+           .width = 11640, .height = 2220},
           LabelAt("FXData_Label", "Data:", kColumn1, kRow1, 1680, header),
           FieldAt("FXData", ControlType::DTPicker, kColumn1, kRow1 + kFieldBelowCaption, 1680, header),
           LabelAt("FXTipo_Diario_ID_Label", "Tipo de Diário:", kColumn2, kRow1, 1800, header),
@@ -110,23 +111,23 @@ forms::FormDesign frmMain::Design() {
           FieldAt("FXRelated_ID", ControlType::TextBox, kColumn3, kRow3 + kFieldBelowCaption,
                 kColumn3Width, header),
           LabelAt("FXObs_Label", "Obs:", 120, 2940, 1200),
-          FieldAt("FXObs", ControlType::TextBox, 120, 3180, 11760, "", {{"MaxLength", 2000}}),
+          FieldAt("FXObs", ControlType::TextBox, 120, 3180, 11640, "", {{"MaxLength", 2000}}),
 
           // The lines.
           {.name = "Frame2", .type = ControlType::Frame, .left = 120, .top = 3600,
-           .width = 11760, .height = 4140},
-          {.name = "Toolbar2", .type = ControlType::Toolbar, .left = 240, .top = 3720,
-           .width = 6600, .height = 420, .container = lines,
+           .width = 11640, .height = 4140},
+          {.name = "Toolbar2", .type = ControlType::Toolbar, .left = 120, .top = 120,
+           .width = 11280, .height = 420, .container = lines,
            .items = {{.key = "novo", .caption = Padded("&Novo (F2)", 3)},
                      {.key = "abrir", .caption = Padded("&Abrir", 11)},
                      {.key = "remover", .caption = Padded("&Remover", 4)},
                      {.key = "importar", .caption = Padded("&Importar", 5)},
                      {.key = "predefinidos", .caption = "&Predefinidos"}}},
-          LabelAt("Label_Extracto", "Extracto de Lançamento:", 240, 4200, 3000, lines),
-          {.name = "ListView1_Frame", .type = ControlType::Frame, .left = 240, .top = 4440,
-           .width = 11520, .height = 2760, .container = lines},
-          {.name = "ListView1", .type = ControlType::ListView, .left = 300, .top = 4500,
-           .width = 11400, .height = 2640, .container = "ListView1_Frame",
+          LabelAt("Label_Extracto", "Extracto de Lançamento:", 120, 600, 3000, lines),
+          {.name = "ListView1_Frame", .type = ControlType::Frame, .left = 120, .top = 840,
+           .width = 11400, .height = 2760, .container = lines},
+          {.name = "ListView1", .type = ControlType::ListView, .left = 60, .top = 60,
+           .width = 11280, .height = 2640, .container = "ListView1_Frame",
            .items = {{.key = "reg_no", .caption = "Nº Reg.", .width = 800, .alignment = list},
                      {.key = "subconta", .caption = "Subconta", .width = 1250, .alignment = list},
                      {.key = "subconta_descrit", .caption = "Subconta (Descrição)", .width = 1250,
@@ -138,14 +139,14 @@ forms::FormDesign frmMain::Design() {
                      {.key = "iva_base", .caption = "IVA Base", .width = 1300, .alignment = right},
                      {.key = "debito", .caption = "Débito", .width = 1400, .alignment = right},
                      {.key = "credito", .caption = "Crédito", .width = 1400, .alignment = right}}},
-          LabelAt("FXTotal_Debitos_Label", "Total de Débitos:", 5280, 7350, 1560, lines),
-          FieldAt("FXTotal_Debitos", ControlType::TextBox, 6840, 7290, 1680, lines,
+          LabelAt("FXTotal_Debitos_Label", "Total de Débitos:", 4680, 3750, 1800, lines),
+          FieldAt("FXTotal_Debitos", ControlType::TextBox, 6480, 3690, 1680, lines,
                 DisplayOnly(forms::vbRightJustify)),
-          LabelAt("FXTotal_Creditos_Label", "Total de Créditos:", 8580, 7350, 1560, lines),
-          FieldAt("FXTotal_Creditos", ControlType::TextBox, 10140, 7290, 1620, lines,
+          LabelAt("FXTotal_Creditos_Label", "Total de Créditos:", 8220, 3750, 1800, lines),
+          FieldAt("FXTotal_Creditos", ControlType::TextBox, 10020, 3690, 1500, lines,
                 DisplayOnly(forms::vbRightJustify)),
-          LabelAt("FXContador_label", "Contador do Diário:", 120, 7890, 1680),
-          FieldAt("FXContador", ControlType::TextBox, 1800, 7830, 1800, "",
+          LabelAt("FXContador_label", "Contador do Diário:", 120, 7890, 2280),
+          FieldAt("FXContador", ControlType::TextBox, 2400, 7830, 1800, "",
                 DisplayOnly(forms::vbRightJustify)),
 
           // The context menu of the list: no menu bar of its own.

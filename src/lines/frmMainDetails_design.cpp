@@ -1,6 +1,7 @@
 // The line editor's design: one row per control, top to bottom as the keyboard walks
 // them. Read-only fields are locked, grey and out of the tab order; the amounts are
-// bold and right-aligned; the VAT controls sit together in one frame.
+// bold and right-aligned; the VAT controls sit together in one frame, placed from its
+// corner.
 
 #include "lines/frmMainDetails.h"
 
@@ -55,7 +56,7 @@ forms::FormDesign frmMainDetails::Design() {
   debit.properties.push_back({"FontBold", true});
   ControlDesign credit = Field("FXCredito", 4560, 2760, 1800, 6, true);
   credit.properties.push_back({"FontBold", true});
-  ControlDesign base = ShownField("FXIVA_Base_Tributavel", 1680, 4440, 1800, true);
+  ControlDesign base = ShownField("FXIVA_Base_Tributavel", 1560, 1140, 1800, true);
   base.container = "Frame1";
 
   return {
@@ -96,21 +97,21 @@ forms::FormDesign frmMainDetails::Design() {
 
           {.name = "Frame1", .type = ControlType::Frame, .left = 120, .top = 3300, .width = 7560,
            .height = 1620},
-          {.name = "FXIVA", .type = ControlType::CheckBox, .left = 240, .top = 3540, .width = 3600,
+          {.name = "FXIVA", .type = ControlType::CheckBox, .left = 120, .top = 240, .width = 3600,
            .height = 255, .caption = "Lançamento para mapa de IVA", .container = "Frame1",
            .properties = {{"TabIndex", 7}}},
-          {.name = "FXIVA_Apuramento", .type = ControlType::CheckBox, .left = 4440, .top = 3540,
+          {.name = "FXIVA_Apuramento", .type = ControlType::CheckBox, .left = 4320, .top = 240,
            .width = 2400, .height = 255, .caption = "Apuramento", .container = "Frame1",
            .properties = {{"TabIndex", 9}}},
-          {.name = "FXIVA_Tx_ID_Label", .type = ControlType::Label, .left = 240, .top = 4020,
+          {.name = "FXIVA_Tx_ID_Label", .type = ControlType::Label, .left = 120, .top = 720,
            .width = 1380, .height = 255, .caption = "Taxa de IVA:", .container = "Frame1"},
-          {.name = "FXIVA_Tx_ID", .type = ControlType::ComboBox, .left = 1680, .top = 3990,
+          {.name = "FXIVA_Tx_ID", .type = ControlType::ComboBox, .left = 1560, .top = 690,
            .width = 4200, .height = kRowHeight, .container = "Frame1",
            .properties = {{"Style", forms::vbComboDropDownList},
                           {"BackColor", forms::vbButtonFace},
                           {"TabIndex", 8}}},
-          {.name = "FXIVA_Base_Tributavel_Label", .type = ControlType::Label, .left = 240,
-           .top = 4470, .width = 1380, .height = 255, .caption = "Base Tributável:",
+          {.name = "FXIVA_Base_Tributavel_Label", .type = ControlType::Label, .left = 120,
+           .top = 1170, .width = 1380, .height = 255, .caption = "Base Tributável:",
            .container = "Frame1"},
           base,
 
