@@ -1,5 +1,7 @@
 #include "platform/forms/Utf8.h"
 
+#include "platform/vb/Utf8.h"
+
 namespace forms::utf8 {
 
 namespace {
@@ -25,22 +27,7 @@ size_t Offset(std::string_view text, size_t index) {
 
 std::string Encode(int codePoint) {
   std::string out;
-  auto cp = static_cast<unsigned>(codePoint);
-  if (cp < 0x80) {
-    out += static_cast<char>(cp);
-  } else if (cp < 0x800) {
-    out += static_cast<char>(0xC0 | (cp >> 6));
-    out += static_cast<char>(0x80 | (cp & 0x3F));
-  } else if (cp < 0x10000) {
-    out += static_cast<char>(0xE0 | (cp >> 12));
-    out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
-    out += static_cast<char>(0x80 | (cp & 0x3F));
-  } else {
-    out += static_cast<char>(0xF0 | (cp >> 18));
-    out += static_cast<char>(0x80 | ((cp >> 12) & 0x3F));
-    out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
-    out += static_cast<char>(0x80 | (cp & 0x3F));
-  }
+  vb::AppendUtf8(out, static_cast<uint32_t>(codePoint));
   return out;
 }
 

@@ -6,6 +6,7 @@
 #include <optional>
 
 #include "platform/registry/Registry.h"
+#include "platform/vb/Utf8.h"
 
 namespace registry::regtext {
 
@@ -50,24 +51,6 @@ std::optional<uint32_t> ParseHex(std::string_view digits, size_t maxDigits) {
     value = value * 16 + static_cast<uint32_t>(nibble);
   }
   return value;
-}
-
-void AppendUtf8(std::string& out, uint32_t cp) {
-  if (cp < 0x80) {
-    out += static_cast<char>(cp);
-  } else if (cp < 0x800) {
-    out += static_cast<char>(0xC0 | (cp >> 6));
-    out += static_cast<char>(0x80 | (cp & 0x3F));
-  } else if (cp < 0x10000) {
-    out += static_cast<char>(0xE0 | (cp >> 12));
-    out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
-    out += static_cast<char>(0x80 | (cp & 0x3F));
-  } else {
-    out += static_cast<char>(0xF0 | (cp >> 18));
-    out += static_cast<char>(0x80 | ((cp >> 12) & 0x3F));
-    out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
-    out += static_cast<char>(0x80 | (cp & 0x3F));
-  }
 }
 
 void AppendUtf16Le(std::string& out, uint32_t unit) {
@@ -364,7 +347,7 @@ std::string Utf16LeToUtf8(std::string_view bytes) {
     } else if (cp >= 0xD800 && cp <= 0xDFFF) {
       cp = 0xFFFD;  // half of a pair
     }
-    AppendUtf8(out, cp);
+    vb::AppendUtf8(out, cp);
   }
   return out;
 }
