@@ -22,23 +22,4 @@ const automation::ServerModule& Module() {
 
 }  // namespace
 
-extern "C" {
-
-automation::HRESULT DllRegisterServer(void) noexcept {
-  return automation::RegisterServer(Module(), &kModuleAnchor);
-}
-
-automation::HRESULT DllUnregisterServer(void) noexcept {
-  return automation::UnregisterServer(Module());
-}
-
-automation::HRESULT DllGetClassObject(const char* clsid,
-                                      automation::IClassFactory** factory) noexcept {
-  return automation::GetClassObject(Module(), clsid, factory);
-}
-
-automation::HRESULT DllCanUnloadNow(void) noexcept {
-  return ravelport::LiveObjects().CanUnloadNow();
-}
-
-}  // extern "C"
+DV_INPROC_SERVER_ENTRY_POINTS(Module, kModuleAnchor, ravelport::LiveObjects())

@@ -31,21 +31,4 @@ const automation::ServerModule& Module() {
 
 }  // namespace
 
-extern "C" {
-
-automation::HRESULT DllRegisterServer(void) noexcept {
-  return automation::RegisterServer(Module(), &kModuleAnchor);
-}
-
-automation::HRESULT DllUnregisterServer(void) noexcept {
-  return automation::UnregisterServer(Module());
-}
-
-automation::HRESULT DllGetClassObject(const char* clsid,
-                                      automation::IClassFactory** factory) noexcept {
-  return automation::GetClassObject(Module(), clsid, factory);
-}
-
-automation::HRESULT DllCanUnloadNow(void) noexcept { return LiveObjects().CanUnloadNow(); }
-
-}  // extern "C"
+DV_INPROC_SERVER_ENTRY_POINTS(Module, kModuleAnchor, LiveObjects())

@@ -112,6 +112,25 @@ DV_SERVER_EXPORT automation::HRESULT DllGetClassObject(const char* clsid,
 DV_SERVER_EXPORT automation::HRESULT DllCanUnloadNow(void) noexcept;
 }
 
+// Defines the four entry points of an in-process server, so each server states only
+// what is its own: the function giving its ServerModule, an object whose address lies
+// in its library (for DllRegisterServer to find the library's path), and the counter of
+// its live objects.
+#define DV_INPROC_SERVER_ENTRY_POINTS(moduleFn, anchor, liveObjects)                      \
+  extern "C" automation::HRESULT DllRegisterServer(void) noexcept {                     \
+    return automation::RegisterServer(moduleFn(), &(anchor));                           \
+  }                                                                                     \
+  extern "C" automation::HRESULT DllUnregisterServer(void) noexcept {                   \
+    return automation::UnregisterServer(moduleFn());                                    \
+  }                                                                                     \
+  extern "C" automation::HRESULT DllGetClassObject(                                     \
+      const char* clsid, automation::IClassFactory** factory) noexcept {                \
+    return automation::GetClassObject(moduleFn(), clsid, factory);                      \
+  }                                                                                     \
+  extern "C" automation::HRESULT DllCanUnloadNow(void) noexcept {                       \
+    return (liveObjects).CanUnloadNow();                                                \
+  }
+
 namespace automation {
 
 // The entry points as the host finds them with dlsym.
