@@ -15,6 +15,7 @@ namespace ado {
 
 namespace embedded {
 extern const std::string_view schema_sqlite;
+extern const std::string_view schema_postgres;
 extern const std::string_view demo_chart;
 extern const std::string_view demo_subaccounts;
 extern const std::string_view demo_journals;
@@ -24,6 +25,7 @@ extern const std::string_view demo_closing;
 }  // namespace embedded
 
 std::string_view EmbeddedSchema() { return embedded::schema_sqlite; }
+std::string_view PostgresSchema() { return embedded::schema_postgres; }
 
 std::vector<std::string_view> EmbeddedDemoData() {
   return {embedded::demo_chart, embedded::demo_subaccounts, embedded::demo_journals,

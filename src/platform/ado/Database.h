@@ -38,6 +38,8 @@ std::string EmbeddedConnectionString(const std::string& path, std::string_view u
 
 // The SQL compiled into the library: the schema, then the demo data files in order.
 std::string_view EmbeddedSchema();
+// The schema for a PostgreSQL database (db/postgresql/schema.sql), run natively.
+std::string_view PostgresSchema();
 std::vector<std::string_view> EmbeddedDemoData();
 
 }  // namespace ado
