@@ -199,10 +199,18 @@ void FormWindow::HideForm() {
 void FormWindow::ChangeOrder(int32_t insertAfter) {
   if (!live_) return;
   if (insertAfter == forms::HWND_TOPMOST || insertAfter == forms::HWND_NOTOPMOST) {
-    bool shown = isVisible();
-    // Changing the flag re-creates the native window, which hides it.
-    setWindowFlag(Qt::WindowStaysOnTopHint, insertAfter == forms::HWND_TOPMOST);
-    if (shown) show();
+    Qt::WindowFlags flags = windowFlags();
+    flags.setFlag(Qt::WindowStaysOnTopHint, insertAfter == forms::HWND_TOPMOST);
+    if (QWindow* native = windowHandle()) {
+      // QWidget::setWindowFlag would re-create the native window. The header editor
+      // goes on top and back on each activation, and every re-creation left the old
+      // window of a modal line editor mapped and never painted, in front of the new
+      // one. The native window takes the flag as it is.
+      overrideWindowFlags(flags);
+      native->setFlags(flags);
+    } else {
+      setWindowFlags(flags);
+    }
   }
   if (insertAfter == forms::HWND_BOTTOM) {
     lower();
@@ -214,6 +222,9 @@ void FormWindow::ChangeOrder(int32_t insertAfter) {
 
 void FormWindow::MirrorFocus() {
   if (!live_ || !form_.Showing()) return;
+  // The model's active form is the one the keyboard works: a window hidden or closed
+  // hands the activation on in the model, and Qt's follows it here.
+  if (forms::ActiveForm() == &form_ && isVisible() && !isActiveWindow()) activateWindow();
   forms::Control* active = form_.ActiveControl();
   ControlView* view = ViewOf(active);
   QWidget* target = view ? view->widget() : nullptr;

@@ -3,6 +3,7 @@
 
 #include <QInputDialog>
 #include <QMessageBox>
+#include <QPointer>
 #include <QPushButton>
 #include <QTimer>
 #include <cstdlib>
@@ -105,8 +106,34 @@ TEST_F(QtDesktopTest, TopMostWindowsStayOnTop) {
   forms::SetWindowPos(form, forms::HWND_TOPMOST, 0, 0, 0, 0, forms::SWP_NOMOVE | forms::SWP_NOSIZE);
   EXPECT_TRUE(Window(form)->windowFlags() & Qt::WindowStaysOnTopHint);
   EXPECT_TRUE(Window(form)->isVisible());
+  // The header editor goes on top and back on each activation: its native window must
+  // stay the one it is, or a modal window it owns is left behind on screen.
+  const WId native = Window(form)->winId();
   forms::SetWindowPos(form, forms::HWND_NOTOPMOST, 0, 0, 0, 0, forms::SWP_NOMOVE | forms::SWP_NOSIZE);
   EXPECT_FALSE(Window(form)->windowFlags() & Qt::WindowStaysOnTopHint);
+  EXPECT_TRUE(Window(form)->isVisible());
+  EXPECT_EQ(Window(form)->winId(), native);
+}
+
+TEST_F(QtDesktopTest, ANoticeReturnsWhileItIsOnScreenAndGoesWhenDismissed) {
+  form.Show();
+  forms::Desktop::Current().ShowNotice("Ravelport", "Falha na gravação do lançamento");
+  // Back here with the box still up: nobody clicked anything.
+  QMessageBox* notice = nullptr;
+  for (QWidget* widget : QApplication::topLevelWidgets())
+    if (widget->objectName() == QStringLiteral("dvNotice") && widget->isVisible())
+      notice = qobject_cast<QMessageBox*>(widget);
+  ASSERT_NE(notice, nullptr);
+  EXPECT_EQ(QApplication::activeModalWidget(), nullptr);
+  EXPECT_EQ(notice->icon(), QMessageBox::Critical);
+  EXPECT_EQ(notice->windowTitle(), QStringLiteral("Ravelport"));
+  EXPECT_EQ(notice->text(), QStringLiteral("Falha na gravação do lançamento"));
+  ASSERT_EQ(notice->buttons().size(), 1);
+
+  QPointer<QMessageBox> watched(notice);
+  notice->button(QMessageBox::Ok)->click();
+  QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+  EXPECT_TRUE(watched.isNull());
 }
 
 TEST_F(QtDesktopTest, TheLoaderLeavesAnInstalledDesktopAlone) {
