@@ -2,12 +2,14 @@
 
 #include <cstdio>
 #include <ctime>
+#include <regex>
 #include <stdexcept>
 
 #include <fmt/format.h>
 #include <nlohmann/json.hpp>
 
 #include "ErrorLog.h"
+#include "platform/forms/Desktop.h"
 #include "platform/vb/Error.h"
 
 namespace ravelport {
@@ -52,6 +54,16 @@ std::string ConsoleLine(const ReportRecord& report) {
   return line;
 }
 
+std::string NoticeText(const ReportRecord& report) {
+  static const std::regex kSecret(
+      R"(((?:password|pwd|user id|uid|user|data source|server|address|initial catalog|database|dsn)\s*=)[^;]*)",
+      std::regex::icase);
+  static const std::regex kEncoded(R"(dv1:[A-Za-z0-9+/=]+)");
+  std::string text = fmt::format("{}.{}: {}", report.module, report.procedure, report.message);
+  text = std::regex_replace(text, kSecret, "$1***");
+  return std::regex_replace(text, kEncoded, "***");
+}
+
 const automation::MemberTable<Reporter>& Reporter::Members() {
   static const auto table = automation::MemberTable<Reporter>().Method(
       "Report", {5, 5}, [](Reporter& self, automation::Args& a) {
@@ -71,6 +83,12 @@ void Reporter::Report(const ReportRecord& report) {
   } catch (const std::runtime_error& e) {
     throw vb::Error(kErrPathFileAccess, fmt::format("the error log cannot be written: {}", e.what()),
                     "Ravelport.General");
+  }
+  try {
+    forms::Desktop::Current().ShowNotice(report.product, NoticeText(report));
+  } catch (const std::exception& e) {
+    std::fputs(fmt::format("Ravelport.General: the notice could not be shown: {}\n", e.what()).c_str(),
+               stderr);
   }
 }
 

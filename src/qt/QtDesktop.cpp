@@ -116,6 +116,20 @@ int QtDesktop::MsgBox(const forms::MessageBox& box) {
   return escape != 0 ? escape : box.DefaultAnswer();
 }
 
+void QtDesktop::ShowNotice(const std::string& title, const std::string& text) {
+  // Owned by no window: the notice outlives the form that was on screen when it came,
+  // and deletes itself when the person dismisses it. Shown, not executed: whoever
+  // called goes on while it is on screen.
+  auto* notice = new QMessageBox(QMessageBox::Critical,
+                                 ToQ(title.empty() ? forms::ApplicationTitle() : title),
+                                 ToQ(text), QMessageBox::Ok);
+  notice->setObjectName(QStringLiteral("dvNotice"));
+  notice->setTextFormat(Qt::PlainText);
+  notice->setAttribute(Qt::WA_DeleteOnClose);
+  notice->setWindowModality(Qt::NonModal);
+  notice->show();
+}
+
 std::string QtDesktop::InputBox(const forms::InputRequest& request) {
   QInputDialog dialog(DialogParent());
   dialog.setWindowTitle(ToQ(request.title.empty() ? forms::ApplicationTitle() : request.title));

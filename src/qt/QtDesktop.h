@@ -25,6 +25,8 @@ class QtDesktop : public forms::Desktop {
   int MsgBox(const forms::MessageBox& box) override;
   std::string InputBox(const forms::InputRequest& request) override;
   void DoEvents() override;
+  // A non-modal message box (critical icon, one OK) that returns at once.
+  void ShowNotice(const std::string& title, const std::string& text) override;
 
   int32_t ScreenWidth() const override;
   int32_t ScreenHeight() const override;

@@ -326,6 +326,9 @@ TEST_F(AutomateTest, AModalWindowIsWorkedUntilItClosesThenItsRequestAnswers) {
   EXPECT_EQ(driver.Read(), (Json{{"event", "report"}, {"product", "POC Dorvantos"},
                                  {"project", "Dorvantos"}, {"module", "frmFake"},
                                  {"procedure", "mnRelatar_Click"}, {"message", "Caixa 1"}}));
+  // The reporter shows it to the person as well, after logging it.
+  EXPECT_EQ(driver.Read(), (Json{{"event", "notice"}, {"title", "POC Dorvantos"},
+                                 {"text", "frmFake.mnRelatar_Click: Caixa 1"}}));
   EXPECT_EQ(driver.Read()["ok"], true);  // the right click's own response
   std::vector<std::string> logged = ErrorLogLines();
   ASSERT_EQ(logged.size(), 1u);

@@ -7,6 +7,7 @@
 #include "platform/automation/TestSandbox.h"
 #include "platform/automation/CreateObject.h"
 #include "platform/automation/ServerLoader.h"
+#include "platform/forms/ScriptedDesktop.h"
 #include "platform/vb/Error.h"
 #include "platform/vb/Variant.h"
 
@@ -19,7 +20,11 @@ class RavelportTest : public ::testing::Test {
   void SetUp() override {
     const auto& server = automation::LoadInprocServer(dvtest::LibraryPath("libravelport.so"));
     ASSERT_EQ(server.registerServer(), automation::S_OK);
+    // The console desktop would print each notice too; the stderr line checked here is
+    // the reporter's own.
+    forms::Desktop::Install(desktop_);
   }
+  void TearDown() override { forms::Desktop::Install(nullptr); }
 
   static void Report(const std::string& message) {
     automation::CreateObject("Ravelport.General")
@@ -28,6 +33,7 @@ class RavelportTest : public ::testing::Test {
   }
 
   dvtest::Sandbox sandbox_;
+  std::shared_ptr<forms::ScriptedDesktop> desktop_ = std::make_shared<forms::ScriptedDesktop>();
 };
 
 TEST_F(RavelportTest, EachReportIsOneJsonLineAndOneStderrLine) {
@@ -86,6 +92,40 @@ TEST_F(RavelportTest, ALogThatCannotBeWrittenIsAnErrorNotASilentLoss) {
   }
   // Still seen on stderr.
   EXPECT_NE(testing::internal::GetCapturedStderr().find("frmMain.DoGravar: x"), std::string::npos);
+}
+
+TEST_F(RavelportTest, EachLoggedReportIsShownWithoutSecrets) {
+  testing::internal::CaptureStderr();
+  Report("Falha na ligação: Password=segredo;User ID=demo;Data Source=sqlite:/srv/poc.db");
+  Report("Palavra-passe dv1:QUJDREVGR0hJSktM+/= recusada");
+  testing::internal::GetCapturedStderr();
+
+  ASSERT_EQ(desktop_->notices.size(), 2u);
+  EXPECT_EQ(desktop_->notices[0].title, "POC Dorvantos");
+  EXPECT_EQ(desktop_->notices[0].text,
+            "frmMain.DoGravar: Falha na ligação: Password=***;User ID=***;Data Source=***");
+  EXPECT_EQ(desktop_->notices[1].text, "frmMain.DoGravar: Palavra-passe *** recusada");
+  // Nothing was asked of the person.
+  EXPECT_TRUE(desktop_->messages.empty());
+  // The log keeps what happened, and came first.
+  ASSERT_EQ(sandbox_.ErrorLogLines().size(), 2u);
+}
+
+// A desktop whose notice fails: the report has been logged and stays a success.
+class FailingNoticeDesktop : public forms::ScriptedDesktop {
+ public:
+  void ShowNotice(const std::string&, const std::string&) override {
+    throw std::runtime_error("no display");
+  }
+};
+
+TEST_F(RavelportTest, ANoticeThatFailsLosesNoLogLine) {
+  forms::Desktop::Install(std::make_shared<FailingNoticeDesktop>());
+  testing::internal::CaptureStderr();
+  EXPECT_NO_THROW(Report("Type mismatch"));
+  std::string console = testing::internal::GetCapturedStderr();
+  EXPECT_EQ(sandbox_.ErrorLogLines().size(), 1u);
+  EXPECT_NE(console.find("no display"), std::string::npos) << console;
 }
 
 TEST_F(RavelportTest, ReportTakesExactlyFiveArguments) {

@@ -1,6 +1,9 @@
 #include "platform/forms/Desktop.h"
 
+#include <fmt/format.h>
+
 #include <array>
+#include <cstdio>
 #include <span>
 
 #include "platform/forms/ConsoleDesktop.h"
@@ -74,6 +77,11 @@ Desktop& Desktop::Current() {
 void Desktop::Install(std::shared_ptr<Desktop> desktop) { InstalledSlot() = std::move(desktop); }
 
 std::shared_ptr<Desktop> Desktop::Installed() { return InstalledSlot(); }
+
+void Desktop::ShowNotice(const std::string& title, const std::string& text) {
+  fmt::print(stderr, "[{}] {}\n", title.empty() ? ApplicationTitle() : title, text);
+  std::fflush(stderr);
+}
 
 void Desktop::ShowModal(Form& form) {
   form.Display(true);

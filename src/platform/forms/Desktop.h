@@ -80,6 +80,10 @@ class Desktop {
   virtual std::string InputBox(const InputRequest& request) = 0;
   // Lets pending window messages run.
   virtual void DoEvents() = 0;
+  // Tells the person something without waiting for them: the caller goes on at once
+  // and the notice stays until dismissed. For what must be seen but asks nothing (an
+  // error already recorded elsewhere). By default it goes to standard error.
+  virtual void ShowNotice(const std::string& title, const std::string& text);
 
   // The screen's size in twips (1920 x 1080 pixels unless a desktop knows better).
   virtual int32_t ScreenWidth() const { return 1920 * 15; }

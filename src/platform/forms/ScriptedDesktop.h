@@ -20,6 +20,9 @@ class ScriptedDesktop : public Desktop {
   int MsgBox(const MessageBox& box) override;
   std::string InputBox(const InputRequest& request) override;
   void DoEvents() override { ++doEventsCalls; }
+  void ShowNotice(const std::string& title, const std::string& text) override {
+    notices.push_back({title, text});
+  }
 
   int32_t ScreenWidth() const override { return screenWidth; }
   int32_t ScreenHeight() const override { return screenHeight; }
@@ -50,6 +53,11 @@ class ScriptedDesktop : public Desktop {
 
   std::vector<MessageBox> messages;
   std::vector<InputRequest> inputs;
+  struct Notice {
+    std::string title;
+    std::string text;
+  };
+  std::vector<Notice> notices;
   int doEventsCalls = 0;
 
   // Names of the forms shown modally or waited on, in order.
