@@ -133,6 +133,8 @@ class AutomationDesktop : public forms::Desktop {
   int MsgBox(const forms::MessageBox& box) override;
   std::string InputBox(const forms::InputRequest& request) override;
   void DoEvents() override {}
+  // A notice asks nothing: it becomes an event and the call goes on.
+  void ShowNotice(const std::string& title, const std::string& text) override;
   void WaitWhileVisible(forms::Form& form) override;
   forms::Menu* ShowPopupMenu(forms::Form& form, forms::Menu& menu, float, float) override;
 
@@ -255,6 +257,11 @@ class ReportRelay : public vb::Object {
 int AutomationDesktop::MsgBox(const forms::MessageBox& box) { return driver_.AskMsgBox(box); }
 std::string AutomationDesktop::InputBox(const forms::InputRequest& request) {
   return driver_.AskInput(request);
+}
+void AutomationDesktop::ShowNotice(const std::string& title, const std::string& text) {
+  driver_.Emit({{"event", "notice"},
+                {"title", title.empty() ? forms::ApplicationTitle() : title},
+                {"text", text}});
 }
 void AutomationDesktop::WaitWhileVisible(forms::Form& form) { driver_.WaitWhileShowing(form); }
 forms::Menu* AutomationDesktop::ShowPopupMenu(forms::Form& form, forms::Menu& menu, float, float) {
