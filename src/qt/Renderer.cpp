@@ -1,5 +1,6 @@
 #include "qt/Renderer.h"
 
+#include <QTimer>
 #include <algorithm>
 
 #include "platform/forms/Control.h"
@@ -50,6 +51,10 @@ FormWindow* Renderer::EnsureWindow(forms::Form& form) {
 
 void Renderer::RunInput(forms::Form& form, const std::function<void()>& action) {
   if (!IsLoadedForm(&form)) return;
+  // A handler may drop the last reference to its own form (the line editor that the
+  // header editor replaces with the next one): the form lives until the action and
+  // the model code around it are done with it.
+  const std::shared_ptr<vb::Object> keep = form.weak_from_this().lock();
   ++depth_;
   Guarded(action, "input");
   --depth_;
@@ -70,7 +75,15 @@ void Renderer::FlushAll() {
         if (ControlView* view = window->ViewOf(control.get())) view->Flush();
 }
 
-void Renderer::Reap() { retired_.clear(); }
+void Renderer::Reap() {
+  if (retired_.empty() || reapPending_) return;
+  reapPending_ = true;
+  QTimer::singleShot(0, &later_, [this] {
+    reapPending_ = false;
+    // Inside a handler's nested loop the windows wait for RunInput to unwind.
+    if (depth_ == 0) retired_.clear();
+  });
+}
 
 void Renderer::AddWaiter(const forms::Form& form, QEventLoop* loop) { waiters_.emplace(&form, loop); }
 
@@ -99,6 +112,7 @@ void Renderer::FormShown(forms::Form& form, bool modal) {
 void Renderer::FormHidden(forms::Form& form) {
   if (FormWindow* window = WindowOf(form)) window->HideForm();
   StopWaiters(form);
+  FollowActivation();
 }
 
 void Renderer::FormUnloaded(forms::Form& form) {
@@ -110,6 +124,15 @@ void Renderer::FormUnloaded(forms::Form& form) {
   retired_.push_back(std::move(found->second));
   windows_.erase(found);
   if (depth_ == 0) Reap();
+  FollowActivation();
+}
+
+void Renderer::FollowActivation() {
+  // The model picks the next active form only after telling of the hide or unload.
+  QTimer::singleShot(0, &later_, [this] {
+    forms::Form* active = forms::ActiveForm();
+    if (active && IsLoadedForm(active)) MirrorFocus(*active);
+  });
 }
 
 void Renderer::FormChanged(forms::Form& form, std::string_view property) {

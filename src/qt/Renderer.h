@@ -58,13 +58,20 @@ class Renderer : public forms::FormListener {
  private:
   FormWindow* EnsureWindow(forms::Form& form);
   void StopWaiters(const forms::Form& form);
+  // Disposes of retired windows from the event loop, never from inside an event of
+  // theirs: the view whose handler unloaded its form still runs after the model returns.
   void Reap();
+  // Gives Qt's activation to the window of the form the model made active.
+  void FollowActivation();
 
   TwipsScale scale_;
   std::unordered_map<const forms::Form*, std::unique_ptr<FormWindow>> windows_;
   std::vector<std::unique_ptr<FormWindow>> retired_;
   std::unordered_multimap<const forms::Form*, QEventLoop*> waiters_;
   int depth_ = 0;
+  bool reapPending_ = false;
+  // Owns the timers of deferred work, so none fires after the renderer is gone.
+  QObject later_;
 };
 
 // Whether the form object is still one the model lists as loaded: a window never
