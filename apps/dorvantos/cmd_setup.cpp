@@ -12,11 +12,11 @@
 #include <cstdlib>
 #include <filesystem>
 #include <optional>
-#include <random>
 #include <string>
 #include <system_error>
 
 #include "commands.h"
+#include "setup_settings.h"
 #include "common/PasswordCodec.h"
 #include "platform/ado/Database.h"
 #include "platform/registry/Registry.h"
@@ -30,9 +30,6 @@ constexpr const char* kSetupUsage =
     "usage: dorvantos setup-demo [--db PATH] [--registry PATH] [--user NAME] "
     "[--password TEXT] [--force]\n";
 constexpr const char* kEncodeUsage = "usage: dorvantos encode-password TEXT\n";
-constexpr const char* kSettingsKey = "HKEY_LOCAL_MACHINE\\SOFTWARE\\Quorvex\\POC";
-// The login of the component's shared connection; nobody types its password.
-constexpr const char* kSharedLogin = "poc_dorvantos";
 
 struct SetupOptions {
   std::string db;
@@ -79,18 +76,6 @@ std::optional<SetupOptions> ParseSetup(const Args& args) {
   return options;
 }
 
-// A password for the shared connection's login: 32 characters from a 62-letter
-// alphabet, drawn from the system's random source.
-std::string RandomPassword() {
-  static constexpr std::string_view kAlphabet =
-      "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789";
-  std::random_device random;
-  std::uniform_int_distribution<size_t> pick(0, kAlphabet.size() - 1);
-  std::string password;
-  for (int i = 0; i < 32; ++i) password += kAlphabet[pick(random)];
-  return password;
-}
-
 void CreateDemoDatabase(const SetupOptions& options, const std::string& sharedPassword) {
   namespace fs = std::filesystem;
   fs::path folder = fs::path(options.db).parent_path();
@@ -107,20 +92,6 @@ void CreateDemoDatabase(const SetupOptions& options, const std::string& sharedPa
   // The ledger and the login hashes are its owner's alone, like the settings file.
   fs::permissions(options.db, fs::perms::owner_read | fs::perms::owner_write,
                   fs::perm_options::replace);
-}
-
-// The five values the component's Login reads, in one write: a host never sees half
-// of them.
-void WriteConnectionSettings(const SetupOptions& options, const std::string& sharedPassword) {
-  std::string encoded = common::EncodePassword(sharedPassword);
-  registry::Store::Default().Update([&](registry::Hive& hive) {
-    registry::Key& key = hive.Create(kSettingsKey);
-    key.Set("dtSecurityInfo", {registry::REG_SZ, "False"});
-    key.Set("dtUser", {registry::REG_SZ, kSharedLogin});
-    key.Set("dtPassword", {registry::REG_SZ, encoded});
-    key.Set("dtInitialCatalog", {registry::REG_SZ, "POC"});
-    key.Set("dtDataSource", {registry::REG_SZ, "sqlite:" + options.db});
-  });
 }
 
 }  // namespace
@@ -141,7 +112,7 @@ int RunSetupDemo(const Args& args) {
   try {
     const std::string sharedPassword = RandomPassword();
     CreateDemoDatabase(*options, sharedPassword);
-    WriteConnectionSettings(*options, sharedPassword);
+    WriteConnectionSettings("sqlite:" + options->db, "POC", sharedPassword);
   } catch (const std::exception& e) {
     fmt::print(stderr, "dorvantos setup-demo: {}\n", e.what());
     return 1;

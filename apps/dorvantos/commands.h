@@ -16,6 +16,7 @@ int RunUnregister(const Args& args);  // unregister [LIBRARY...]
 int RunUser(const Args& args);        // user add NAME [--password TEXT] [--db PATH]
 int RunSetupDemo(const Args& args);   // setup-demo [--db PATH] [--registry PATH] [--user NAME]
                                       //            [--password TEXT] [--force]
+int RunSetupServer(const Args& args);  // setup-server --server SOURCE --admin-user NAME ...
 int RunEncodePassword(const Args& args);  // encode-password TEXT
 int RunAutomate(const Args& args);        // automate [--registry PATH]
 int RunDemo(const Args& args);            // demo [--user NAME] [--password TEXT]

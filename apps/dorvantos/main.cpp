@@ -34,6 +34,10 @@ constexpr const char* kUsage =
     "  setup-demo [--db PATH] [--registry PATH] [--user NAME] [--password TEXT] [--force]\n"
     "                             create the demo database, its logins and the settings,\n"
     "                             and register the component\n"
+    "  setup-server --server SOURCE --admin-user NAME [--admin-password TEXT] [--catalog NAME]\n"
+    "               [--user NAME] [--password TEXT] [--no-demo-data] [--force]\n"
+    "                             create the ledger on a PostgreSQL or SQL Server server, its\n"
+    "                             logins and the settings, and register the component\n"
     "  encode-password TEXT       print a password in the form Login and the settings take\n"
     "  automate [--registry PATH] drive the component with JSON lines on stdin and stdout\n"
     "  demo [--user NAME] [--password TEXT]\n"
@@ -71,6 +75,7 @@ int main(int argc, char** argv) {
       {"reg", app::RunReg},
       {"user", app::RunUser},
       {"setup-demo", app::RunSetupDemo},
+      {"setup-server", app::RunSetupServer},
       {"encode-password", app::RunEncodePassword},
       {"automate", app::RunAutomate},
       {"demo", app::RunDemo},

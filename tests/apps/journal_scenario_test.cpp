@@ -14,6 +14,7 @@
 #include "platform/ado/Database.h"
 #include "platform/registry/Registry.h"
 #include "platform/registry/Store.h"
+#include "support/TestLedger.h"
 
 namespace {
 
@@ -33,17 +34,16 @@ class JournalScenario : public ::testing::Test {
                                 "/libpoc_dorvantos.so' '" + LibDirectory() +
                                 "/libravelport.so' >/dev/null 2>&1";
     ASSERT_EQ(std::system(command.c_str()), 0);
-    const std::string db = dir_ + "/demo.db";
     ado::CreateOptions options;
     options.passwordIterations = 1000;
-    ado::CreateDatabase(db, {{"poc_dorvantos", "partilhada"}, {"demo", "demo"}}, options);
+    ledger_.emplace(dir_, std::vector<ado::Login>{{"poc_dorvantos", "partilhada"}, {"demo", "demo"}}, options);
     registry::Store(registry).Update([&](registry::Hive& hive) {
       registry::Key& key = hive.Create("HKEY_LOCAL_MACHINE\\SOFTWARE\\Quorvex\\POC");
       key.Set("dtSecurityInfo", {registry::REG_SZ, "False"});
       key.Set("dtUser", {registry::REG_SZ, "poc_dorvantos"});
       key.Set("dtPassword", {registry::REG_SZ, common::EncodePassword("partilhada")});
-      key.Set("dtInitialCatalog", {registry::REG_SZ, "POC"});
-      key.Set("dtDataSource", {registry::REG_SZ, "sqlite:" + db});
+      key.Set("dtInitialCatalog", {registry::REG_SZ, ledger_->Catalog()});
+      key.Set("dtDataSource", {registry::REG_SZ, ledger_->DataSource()});
     });
     driver_.emplace(std::vector<std::string>{"automate", "--registry", registry});
     ASSERT_TRUE(driver_->Started());
@@ -51,6 +51,7 @@ class JournalScenario : public ::testing::Test {
 
   void TearDown() override {
     driver_.reset();
+    ledger_.reset();
     unsetenv("POC_ERROR_LOG");
     std::error_code ignored;
     std::filesystem::remove_all(dir_, ignored);
@@ -84,6 +85,7 @@ class JournalScenario : public ::testing::Test {
 
   std::string dir_;
   std::optional<DriverProcess> driver_;
+  std::optional<dvtest::TestLedger> ledger_;
 };
 
 TEST_F(JournalScenario, AnEntryIsTypedBalancedAndFinalizedThroughItsWindows) {

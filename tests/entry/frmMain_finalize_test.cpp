@@ -313,13 +313,14 @@ TEST_F(FinalizeTest, RestartFinalizesForRealAndMovesOnFromAFinalEntryWhateverThe
   EXPECT_EQ(vb::CLng(EntryColumn(id, "finalizado")), 1);
 }
 
-// Two processes finalize entries of the same database at the same moment, each on its
+// Four processes finalize entries of the same database at the same moment, each on its
 // own connection: every line gets its own number and no number is skipped.
 TEST_F(FinalizeTest, ConcurrentFinalizationsNeverShareOrSkipANumber) {
-  constexpr int kEntriesEach = 10;
+  constexpr int kProcesses = 4;
+  constexpr int kEntriesEach = 6;
   constexpr int kLinesEach = 3;
   SetCounter("reg_no", 100);
-  std::vector<std::vector<int32_t>> entries(2);
+  std::vector<std::vector<int32_t>> entries(kProcesses);
   for (auto& mine : entries)
     for (int e = 0; e < kEntriesEach; ++e) {
       const int32_t id = Entry();
@@ -354,7 +355,7 @@ TEST_F(FinalizeTest, ConcurrentFinalizationsNeverShareOrSkipANumber) {
     children.push_back(pid);
   }
   ::close(start[0]);
-  ASSERT_EQ(::write(start[1], "gg", 2), 2);
+  ASSERT_EQ(::write(start[1], std::string(kProcesses, 'g').data(), kProcesses), kProcesses);
   ::close(start[1]);
   for (pid_t pid : children) {
     int status = 0;
@@ -368,7 +369,7 @@ TEST_F(FinalizeTest, ConcurrentFinalizationsNeverShareOrSkipANumber) {
   rs->Open("SELECT reg_no FROM tbPOC_Dorvantos_Details", common::SqlServer());
   int lines = 0;
   for (; !rs->Eof(); rs->MoveNext(), ++lines) numbers.insert(vb::CLng(rs->Fields(0).Value()));
-  constexpr int kAll = 2 * kEntriesEach * kLinesEach;
+  constexpr int kAll = kProcesses * kEntriesEach * kLinesEach;
   EXPECT_EQ(lines, kAll);
   ASSERT_EQ(numbers.size(), static_cast<size_t>(kAll));
   EXPECT_EQ(*numbers.begin(), 100);

@@ -1,5 +1,6 @@
 #pragma once
-// The header editor against a real embedded database with the demo data, the shared
+// The header editor against a real database with the demo data (embedded, or on the
+// PostgreSQL server under test), the shared
 // connection open on it, a private settings file with the POC key, a logged-in user and
 // the scripted desktop. The windows it opens (line editors, the next header editor) and
 // the host's call-back object are recorders.
@@ -13,6 +14,7 @@
 #include <filesystem>
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -27,6 +29,7 @@
 #include "platform/registry/Store.h"
 #include "platform/vb/Conversions.h"
 #include "platform/vb/Error.h"
+#include "support/TestLedger.h"
 
 namespace entry::testing {
 
@@ -104,9 +107,9 @@ class HeaderEditorTest : public ::testing::Test {
     registry::Store::SetDefaultPath((folder_ / "registry.reg").string());
     registry::Store::Default().Update([](registry::Hive& hive) { hive.Create(kPocSettingsKey); });
 
-    const std::string db = (folder_ / "poc.db").string();
-    ado::CreateDatabase(db, {{"ana", "segredo"}}, {.demoData = true, .passwordIterations = 10});
-    common::SqlServer()->Open(ado::EmbeddedConnectionString(db, "ana", "segredo"));
+    ledger_.emplace(folder_.string(), std::vector<ado::Login>{{"ana", "segredo"}},
+                    ado::CreateOptions{.demoData = true, .passwordIterations = 10});
+    common::SqlServer()->Open(ledger_->ConnectionString("ana", "segredo"));
     component::RecordLoggedUser("ana", "segredo");
     component::SetLoggedIn();
 
@@ -128,6 +131,7 @@ class HeaderEditorTest : public ::testing::Test {
     form.reset();
     forms::Desktop::Install(previous_);
     if (common::SqlServer()->State() == ado::adStateOpen) common::SqlServer()->Close();
+    ledger_.reset();
     registry::Store::SetDefaultPath("");
     std::error_code ignored;
     std::filesystem::remove_all(folder_, ignored);
@@ -215,6 +219,7 @@ class HeaderEditorTest : public ::testing::Test {
   }
 
   std::filesystem::path folder_;
+  std::optional<dvtest::TestLedger> ledger_;
   std::shared_ptr<forms::Desktop> previous_;
 };
 

@@ -8,6 +8,8 @@
 #include <stdexcept>
 #include <vector>
 
+#include "platform/ado/Utf16.h"
+
 namespace ado {
 
 TextCollator::TextCollator() {
@@ -30,16 +32,6 @@ int TextCollator::Compare(std::string_view a, std::string_view b) const {
 }
 
 namespace {
-
-std::u16string ToUtf16(std::string_view utf8) {
-  std::u16string out(utf8.size() + 1, u'\0');
-  int32_t length = 0;
-  UErrorCode status = U_ZERO_ERROR;
-  u_strFromUTF8WithSub(out.data(), static_cast<int32_t>(out.size()), &length, utf8.data(),
-                       static_cast<int32_t>(utf8.size()), 0xFFFD, nullptr, &status);
-  out.resize(U_SUCCESS(status) ? static_cast<size_t>(length) : 0);
-  return out;
-}
 
 std::u16string Fold(const std::u16string& in) {
   UErrorCode status = U_ZERO_ERROR;

@@ -1,5 +1,6 @@
 #include "platform/ado/Engine.h"
 
+#include "platform/ado/OdbcEngine.h"
 #include "platform/ado/SqliteEngine.h"
 
 namespace ado {
@@ -27,13 +28,15 @@ std::unique_ptr<Engine> OpenEngine(const ConnectionStringParts& parts) {
   if (!EqualsNoCase(provider, "SQLOLEDB") && !EqualsNoCase(provider, "SQLOLEDB.1"))
     throw EngineFailure({3706, "Provider cannot be found. It may not be properly installed.",
                          "ADODB.Connection", {}, 0});
-  std::string path = EmbeddedDatabasePath(parts.GetOr("Data Source", ""));
-  if (path.empty())
+  std::string source = parts.GetOr("Data Source", "");
+  std::string path = EmbeddedDatabasePath(source);
+  if (!path.empty()) return SqliteEngine::Open(path, parts.GetOr("User ID", ""), parts.GetOr("Password", ""));
+  if (ParseServerAddress(source).host.empty())
     throw EngineFailure({kErrProviderFailed,
                          "[DBNETLIB][ConnectionOpen (Connect()).]SQL Server does not exist or "
                          "access denied.",
                          kProviderSource, "08001", 17});
-  return SqliteEngine::Open(path, parts.GetOr("User ID", ""), parts.GetOr("Password", ""));
+  return OdbcEngine::Open(parts, ReadOdbcDrivers());
 }
 
 }  // namespace ado

@@ -62,6 +62,25 @@ std::string FoldedName(const Token& t) {
   return out + "\"";
 }
 
+// A LIKE pattern with [sets] as a SIMILAR TO pattern escaped with "\": the characters
+// that are operators there and plain text in LIKE are escaped.
+std::string SimilarPattern(const std::string& like) {
+  std::string out;
+  bool inSet = false;
+  for (char c : like) {
+    if (inSet) {
+      if (c == '\\') out += '\\';
+      out += c;
+      if (c == ']') inSet = false;
+      continue;
+    }
+    if (c == '[') inSet = true;
+    else if (std::string_view("|*+?{}()\\").find(c) != std::string_view::npos) out += '\\';
+    out += c;
+  }
+  return out;
+}
+
 class PostgresRewriter : public Rewriter {
  public:
   PostgresRewriter(const std::vector<Token>& ts, int tranCount) : Rewriter(ts), tranCount_(tranCount) {}
@@ -199,9 +218,20 @@ class PostgresRewriter : public Rewriter {
   }
 
   // SQL Server's LIKE has no escape character unless one is named; PostgreSQL's is "\".
+  // A literal pattern with a [set] of characters, which PostgreSQL's LIKE does not
+  // know, becomes SIMILAR TO, which keeps "%", "_" and the sets and, on citext, still
+  // ignores case.
   size_t Like(size_t i, size_t e, Output& out) {
     size_t end = AdditiveEnd(i + 1, e);
     if (end == kNoToken) return kNoToken;
+    bool escapeNamed = end < e && T(end).Is("ESCAPE");
+    if (!escapeNamed && end == i + 2 && T(i + 1).kind == TokenKind::String &&
+        T(i + 1).value.find('[') != std::string::npos) {
+      out.Add("SIMILAR TO");
+      out.Add(QuoteLiteral(SimilarPattern(T(i + 1).value)));
+      out.Add("ESCAPE '\\'");
+      return end;
+    }
     out.Add(T(i).text);
     out.Add(Range(i + 1, end));
     if (!(end < e && T(end).Is("ESCAPE"))) out.Add("ESCAPE ''");

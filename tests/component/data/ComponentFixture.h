@@ -1,7 +1,8 @@
 #pragma once
 // The component in-process against a database of its own: a private settings store
 // holding the five connection settings, an error log, the real reporter, a scripted
-// desktop, and a database with the shared connection's login and one host user.
+// desktop, and a database (embedded, or on the PostgreSQL server under test) with the
+// shared connection's login and one host user.
 //
 // The login state and the shared connection live as long as the process, as they do in
 // a host; each test starts with the shared connection closed, so Login runs its steps.
@@ -9,6 +10,7 @@
 #include <gtest/gtest.h>
 
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "common/PasswordCodec.h"
@@ -21,6 +23,7 @@
 #include "platform/automation/TestSandbox.h"
 #include "platform/forms/ScriptedDesktop.h"
 #include "platform/registry/Store.h"
+#include "support/TestLedger.h"
 
 namespace dvtest {
 
@@ -37,15 +40,16 @@ class ComponentTest : public ::testing::Test {
     ASSERT_EQ(reporter.registerServer(), automation::S_OK);
     desktop_ = std::make_shared<forms::ScriptedDesktop>();
     forms::Desktop::Install(desktop_);
-    db_ = sandbox_.Directory() + "/poc.db";
-    ado::CreateDatabase(db_, {{kSharedUser, kSharedPassword}, {kHostUser, kHostPassword}},
-                        {.demoData = false, .passwordIterations = 10});
+    ledger_.emplace(sandbox_.Directory(),
+                    std::vector<ado::Login>{{kSharedUser, kSharedPassword}, {kHostUser, kHostPassword}},
+                    ado::CreateOptions{.demoData = false, .passwordIterations = 10});
     WriteSettings();
     CloseShared();
   }
 
   void TearDown() override {
     CloseShared();
+    ledger_.reset();
     forms::Desktop::Install(nullptr);
   }
 
@@ -59,8 +63,8 @@ class ComponentTest : public ::testing::Test {
     Set("dtSecurityInfo", "False");
     Set("dtUser", kSharedUser);
     Set("dtPassword", common::EncodePassword(kSharedPassword));
-    Set("dtInitialCatalog", "POC");
-    Set("dtDataSource", "sqlite:" + db_);
+    Set("dtInitialCatalog", ledger_->Catalog());
+    Set("dtDataSource", ledger_->DataSource());
   }
 
   void Set(const std::string& name, const std::string& value) {
@@ -82,7 +86,7 @@ class ComponentTest : public ::testing::Test {
 
   Sandbox sandbox_;
   std::shared_ptr<forms::ScriptedDesktop> desktop_;
-  std::string db_;
+  std::optional<dvtest::TestLedger> ledger_;
   component::General general_;
 };
 

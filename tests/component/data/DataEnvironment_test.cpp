@@ -2,6 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+#include <filesystem>
+
 #include "common/ErrorTrap.h"
 #include "common/modFechos.h"
 #include "component/data/ComponentFixture.h"
@@ -147,6 +150,35 @@ TEST_F(DataEnvironmentTest, MissingSettingsGiveUpWithoutAsking) {
   Remove("dtUser");
   EXPECT_EQ(ErrorOf([] { common::SqlServer()->Execute("SELECT 1"); }), vb::kErrConnectionClosed);
   EXPECT_TRUE(desktop_->modalForms.empty());
+  EXPECT_TRUE(sandbox_.ErrorLogLines().empty());
+}
+
+// The database server stops in the middle of a session and comes back: the next
+// statement finds the connection broken and shows the dialog; "Ligar ao servidor SQL"
+// after the restart goes on, and what was written before is still there.
+TEST_F(DataEnvironmentTest, AServerThatStopsAndComesBackIsReconnectedWithNothingLost) {
+  if (!ledger_->OnServer()) GTEST_SKIP() << "needs a database server it may stop";
+  const std::string server = std::string(POC_SOURCE_DIR) + "/scripts/pg-test-server";
+  const std::string folder = std::filesystem::path(std::getenv("POC_TEST_PG_ENV")).parent_path().string();
+  auto run = [&](const std::string& verb) {
+    return std::system(("'" + server + "' " + verb + " '" + folder + "' >/dev/null").c_str());
+  };
+  common::SqlServer()->Execute("INSERT INTO tbFechos (data, descrit, anulado) VALUES (GETDATE(), 'antes', 0)");
+
+  ASSERT_EQ(run("halt"), 0);
+  int shown = 0;
+  desktop_->WhenShown("frmSQLServer", [&](forms::Form& form) {
+    ++shown;
+    auto& dialog = dynamic_cast<frmSQLServer&>(form);
+    EXPECT_EQ(run("resume"), 0);
+    EXPECT_TRUE(forms::KeyboardUser(dialog).Click(dialog.Command1));
+  });
+  common::SqlServer()->Execute("INSERT INTO tbFechos (data, descrit, anulado) VALUES (GETDATE(), 'depois', 0)");
+
+  EXPECT_EQ(shown, 1);
+  EXPECT_EQ(Count("SELECT COUNT(*) FROM tbFechos WHERE descrit IN ('antes', 'depois')"), 2);
+  EXPECT_EQ(common::SqlServer()->Errors().Count(), 0);
+  EXPECT_TRUE(desktop_->leftOpen.empty());
   EXPECT_TRUE(sandbox_.ErrorLogLines().empty());
 }
 

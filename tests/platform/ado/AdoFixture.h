@@ -1,16 +1,18 @@
 #pragma once
-// A fresh demo database in a temporary folder per test, with one login, and a
-// connection opened on it.
+// A fresh demo database per test, with one login, and a connection opened on it: a file
+// in a temporary folder, or a database on the PostgreSQL server under test.
 
 #include <gtest/gtest.h>
 #include <unistd.h>
 
 #include <filesystem>
+#include <optional>
 #include <string>
 
 #include "platform/ado/Connection.h"
 #include "platform/ado/Database.h"
 #include "platform/ado/Recordset.h"
+#include "support/TestLedger.h"
 
 namespace ado::testing {
 
@@ -25,17 +27,22 @@ class DemoDatabase : public ::testing::Test {
             ::testing::UnitTest::GetInstance()->current_test_info()->name());
     std::filesystem::remove_all(dir_);
     std::filesystem::create_directories(dir_);
-    path_ = (dir_ / "demo.db").string();
     CreateOptions options;
     options.passwordIterations = 1000;  // fast in tests; the stored count is per login
-    CreateDatabase(path_, {{kUser, kPassword}}, options);
+    ledger_.emplace(dir_.string(), std::vector<Login>{{kUser, kPassword}}, options);
+    path_ = ledger_->Path();
     conn_ = Connection::Create();
-    conn_->Open(EmbeddedConnectionString(path_, kUser, kPassword));
+    conn_->Open(ConnectionString(kUser, kPassword));
   }
 
   void TearDown() override {
     conn_.reset();
+    ledger_.reset();
     std::filesystem::remove_all(dir_);
+  }
+
+  std::string ConnectionString(const std::string& user, const std::string& password) const {
+    return ledger_->ConnectionString(user, password);
   }
 
   // The single value of a one-row query.
@@ -52,7 +59,8 @@ class DemoDatabase : public ::testing::Test {
   }
 
   std::filesystem::path dir_;
-  std::string path_;
+  std::optional<dvtest::TestLedger> ledger_;
+  std::string path_;  // the embedded database's file; empty on a server
   ConnectionPtr conn_;
 };
 

@@ -48,7 +48,7 @@ TEST_F(DemoContents, creation_refuses_an_existing_file_and_leaves_no_debris) {
   // A login name given twice fails the whole creation: no file is left behind.
   EXPECT_THROW(CreateDatabase(other, {{"ana", "1"}, {"ANA", "2"}}, {.passwordIterations = 10}), std::runtime_error);
   for (const auto& entry : std::filesystem::directory_iterator(dir_))
-    EXPECT_TRUE(entry.path().filename().string().starts_with("demo.db")) << entry.path();
+    EXPECT_TRUE(entry.path().filename().string().starts_with("poc.db")) << entry.path();
 
   CreateDatabase(other, {{"ana", "1"}}, {.demoData = false, .passwordIterations = 10});
   auto conn = Connection::Create();

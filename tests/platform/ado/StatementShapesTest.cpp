@@ -263,7 +263,7 @@ TEST_F(StatementShapes, identity_follows_the_last_insert_of_this_connection) {
   EXPECT_EQ(std::stoi(b), std::stoi(a) + 1);
   // Another connection's insert does not move ours.
   auto other = Connection::Create();
-  other->Open(EmbeddedConnectionString(path_, kUser, kPassword));
+  other->Open(ConnectionString(kUser, kPassword));
   other->Execute("INSERT INTO tbPOC_Dorvantos (created_by, valor, finalizado) VALUES ('x', 0, 0)");
   EXPECT_EQ(Key(Scalar("SELECT @@Identity as last")), b);
   // Keys are never handed out twice, even after the last row is deleted.
