@@ -3,11 +3,10 @@
 
 #include <gtest/gtest.h>
 #include <sys/stat.h>
-#include <sys/wait.h>
 
-#include <cstdio>
 #include <filesystem>
 
+#include "DorvantosCommand.h"
 #include "platform/automation/CreateObject.h"
 #include "platform/automation/TestSandbox.h"
 #include "platform/registry/Store.h"
@@ -17,28 +16,8 @@ namespace {
 
 using vb::Variant;
 
-// The build's bin/ directory: $POC_TEST_BIN under ctest, else the test's own folder.
-std::string Dorvantos() {
-  if (const char* bin = std::getenv("POC_TEST_BIN"); bin && *bin) return std::string(bin) + "/dorvantos";
-  return (std::filesystem::canonical("/proc/self/exe").parent_path() / "dorvantos").string();
-}
-
-struct Outcome {
-  int status = -1;
-  std::string output;
-};
-
-Outcome Command(const std::string& arguments) {
-  Outcome run;
-  std::string line = "'" + Dorvantos() + "' " + arguments + " 2>&1";
-  FILE* pipe = popen(line.c_str(), "r");
-  if (!pipe) return run;
-  char buffer[512];
-  for (size_t n; (n = fread(buffer, 1, sizeof buffer, pipe)) > 0;) run.output.append(buffer, n);
-  int status = pclose(pipe);
-  run.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-  return run;
-}
+using dvtest::Command;
+using dvtest::Outcome;
 
 class SetupDemoTest : public ::testing::Test {
  protected:
