@@ -245,6 +245,16 @@ bool ControlView::OnFocusIn(Qt::FocusReason reason) {
 
 bool ControlView::eventFilter(QObject* watched, QEvent* event) {
   if (forwarding_) return false;
+  // An event the view consumed is done with. A widget that saw it natively may have
+  // ignored it (a date edit passes on F2, which it has no use for), and Qt hands an
+  // ignored key or click on to the parent widgets: the window would give the key to
+  // the model a second time, a frame would take the double click as its own.
+  bool consumed = Filter(watched, event);
+  if (consumed) event->accept();
+  return consumed;
+}
+
+bool ControlView::Filter(QObject* watched, QEvent* event) {
   auto* target = qobject_cast<QWidget*>(watched);
   if (!target) return false;
   bool live = window_.Live();

@@ -101,6 +101,8 @@ class ControlView : public QObject {
   void SyncGeometry();
   void SyncFont();
   bool OnFocusIn(Qt::FocusReason reason);
+  // What eventFilter does with an event; true when the view consumed it.
+  bool Filter(QObject* watched, QEvent* event);
 
   FormWindow& window_;
   forms::Control& control_;

@@ -4,6 +4,7 @@
 #include <gmock/gmock.h>
 
 #include <QCheckBox>
+#include <QDateEdit>
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QPushButton>
@@ -12,6 +13,7 @@
 #include <QTreeWidget>
 
 #include "QtTestSupport.h"
+#include "qt/DatePickerView.h"
 
 namespace dvqt::testing {
 namespace {
@@ -51,6 +53,36 @@ TEST_F(QtDesktopTest, FunctionKeysAndTheKeypadReachKeyDownAndASwallowedKeyTypesN
   QTest::keyClick(text, Qt::Key_X);
   EXPECT_THAT(form.log, ElementsAre("KeyDown 88 0", "KeyUp 88"));
   EXPECT_EQ(text->text(), QStringLiteral("+"));
+}
+
+TEST_F(QtDesktopTest, EachKeyOnADatePickerReachesTheModelOnceInOrder) {
+  // The date edit handles keys natively after the model saw them, and passes on those
+  // it has no use for (F2): the window must not hand them to the model again.
+  forms::DTPicker& picker = form.DTPicker1;
+  picker.KeyDown = [this](int& KeyCode, int) { form.log.push_back("KeyDown " + std::to_string(KeyCode)); };
+  picker.KeyPress = [this](int& KeyAscii) { form.log.push_back("KeyPress " + std::to_string(KeyAscii)); };
+  picker.KeyUp = [this](int& KeyCode, int) { form.log.push_back("KeyUp " + std::to_string(KeyCode)); };
+  picker.Change = [this] { form.log.push_back("Change"); };
+  ShowActive(form);
+  picker.SetFocus();
+  auto* edit = WidgetOf<QDateEdit>(picker);
+  ASSERT_NE(edit, nullptr);
+  ASSERT_TRUE(edit->hasFocus());
+  form.log.clear();
+
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_F2);
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_A);
+  Settle();
+  EXPECT_THAT(form.log, ElementsAre("KeyDown 113", "KeyUp 113", "KeyDown 65", "KeyPress 97", "KeyUp 65"));
+
+  // A key the date edit acts on changes the model's date between KeyDown and KeyUp.
+  form.log.clear();
+  const double before = picker.Value().serial;
+  QTest::keyClick(QApplication::focusWidget(), Qt::Key_Up);
+  Settle();
+  EXPECT_THAT(form.log, ElementsAre("KeyDown 38", "Change", "KeyUp 38"));
+  EXPECT_NE(picker.Value().serial, before);
+  EXPECT_EQ(ToQDate(picker.Value()), edit->date());
 }
 
 TEST_F(QtDesktopTest, EnterClicksTheDefaultButton) {
