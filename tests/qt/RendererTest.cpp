@@ -7,6 +7,7 @@
 #include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPointer>
 #include <QPushButton>
 #include <QToolBar>
 #include <QTreeWidget>
@@ -161,6 +162,30 @@ TEST_F(QtDesktopTest, AWindowFollowsShowHideAndUnload) {
   ASSERT_NE(Window(form), nullptr);
   EXPECT_EQ(WidgetOf<QLineEdit>(form.Text1)->text(), QStringLiteral("de novo"));
   EXPECT_FALSE(Window(form)->isVisible());
+}
+
+TEST_F(QtDesktopTest, AFormDestroyedWhileShownTakesItsWindowAlong) {
+  auto doomed = std::make_unique<SampleForm>();
+  ShowActive(*doomed);
+  const forms::Form* address = doomed.get();
+  QPointer<FormWindow> window = Window(*doomed);
+  QPointer<QWidget> text2 = WidgetOf(doomed->Text2);
+  ASSERT_TRUE(window && text2);
+  // A rebuild still pending when the form goes must not read its list afterwards.
+  doomed->ListView1.ListItems().Add("#1", "2211");
+  doomed.reset();
+
+  EXPECT_EQ(desktop->renderer().WindowOf(*address), nullptr);
+  EXPECT_TRUE(window.isNull() || !window->isVisible());
+  // A person's click and key on what is left, and whatever was queued for the window,
+  // find nothing freed (the sanitizers tell); the window goes from the event loop.
+  if (text2) {
+    QTest::mouseClick(text2, Qt::LeftButton, {}, QPoint(5, 5));
+    QTest::keyClick(text2, Qt::Key_A);
+  }
+  if (window) window->repaint();
+  Settle();
+  EXPECT_TRUE(window.isNull());
 }
 
 }  // namespace

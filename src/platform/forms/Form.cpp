@@ -59,8 +59,26 @@ Form::Form(FormDesign design) : design_(std::move(design)) {
 }
 
 Form::~Form() {
+  // A form destroyed while loaded goes as an unload that nobody can cancel: no handler
+  // of its own runs (what derives from it is gone already), but whoever shows it must
+  // let go of it now, or its window would go on painting and taking input for freed
+  // memory.
+  bool wasLoaded = Loaded();
   std::erase(LoadedList(), this);
   if (ActiveSlot() == this) ActiveSlot() = nullptr;
+  for (Form* form : LoadedList())
+    if (form->owner_ == this) form->owner_ = nullptr;
+  if (wasLoaded) {
+    state_ = State::Created;
+    visible_ = modal_ = false;
+    active_ = nullptr;
+    owner_ = nullptr;
+    try {
+      Tell([&](FormListener& l) { l.FormUnloaded(*this); });
+    } catch (...) {
+      // A destructor throws nothing; a listener that failed keeps its own state.
+    }
+  }
   // Someone may still hold a control; touching it now raises "object not set".
   for (auto& control : controls_) control->Detach();
 }

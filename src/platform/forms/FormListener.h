@@ -19,6 +19,8 @@ class FormListener {
   virtual void FormLoaded(Form&) {}
   virtual void FormShown(Form&, bool modal) {}
   virtual void FormHidden(Form&) {}
+  // Also told when a loaded form is destroyed, from its destructor: a listener then
+  // lets go of the form and touches nothing of it but its address.
   virtual void FormUnloaded(Form&) {}
   // A property of the form itself (Caption, Width, WindowState, MousePointer...).
   virtual void FormChanged(Form&, std::string_view property) {}
