@@ -327,7 +327,7 @@ TEST_F(FinalizeTest, ConcurrentFinalizationsNeverShareOrSkipANumber) {
       for (int l = 0; l < kLinesEach; ++l) Line(id, l == 0 ? "6" : "0", l == 0 ? "0" : "3");
       mine.push_back(id);
     }
-  const std::string connection = common::SqlServer()->ConnectionString();
+  const std::string connection = ledger_->ConnectionString("ana", "segredo");
   form.reset();
   common::SqlServer()->Close();
 

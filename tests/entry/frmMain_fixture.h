@@ -210,6 +210,7 @@ class HeaderEditorTest : public ::testing::Test {
   // What a line editor answers to DoRemove.
   bool lineRemoved = true;
   std::shared_ptr<TestMain> form;
+  std::optional<dvtest::TestLedger> ledger_;
 
  private:
   vb::ObjectPtr Made(std::vector<std::shared_ptr<Recorder>>& made) {
@@ -219,7 +220,6 @@ class HeaderEditorTest : public ::testing::Test {
   }
 
   std::filesystem::path folder_;
-  std::optional<dvtest::TestLedger> ledger_;
   std::shared_ptr<forms::Desktop> previous_;
 };
 

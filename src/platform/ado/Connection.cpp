@@ -20,6 +20,15 @@ void Connection::SetConnectionString(std::string text) {
     throw vb::Error(kErrObjectOpen, "Operation is not allowed when the object is open.",
                     "ADODB.Connection");
   connectionString_ = std::move(text);
+  passwordHidden_ = false;
+}
+
+std::string Connection::ConnectionString() const {
+  if (!passwordHidden_) return connectionString_;
+  ConnectionStringParts parts = ConnectionStringParts::Parse(connectionString_);
+  parts.Remove("Password");
+  parts.Remove("Pwd");
+  return parts.ToString();
 }
 
 void Connection::Raise(const EngineFailure& failure) {
@@ -32,7 +41,10 @@ void Connection::Open(std::string_view connectionString, std::string_view userId
   if (engine_)
     throw vb::Error(kErrObjectOpen, "Operation is not allowed when the object is open.",
                     "ADODB.Connection");
-  if (!connectionString.empty()) connectionString_ = std::string(connectionString);
+  if (!connectionString.empty()) {
+    connectionString_ = std::string(connectionString);
+    passwordHidden_ = false;
+  }
   ConnectionStringParts parts = ConnectionStringParts::Parse(connectionString_);
   if (!userId.empty()) parts.Set("User ID", userId);
   if (!password.empty()) parts.Set("Password", password);
@@ -41,6 +53,7 @@ void Connection::Open(std::string_view connectionString, std::string_view userId
   } catch (const EngineFailure& failure) {
     Raise(failure);
   }
+  passwordHidden_ = !EqualsNoCase(parts.GetOr("Persist Security Info", "False"), "True");
 }
 
 void Connection::Close() {

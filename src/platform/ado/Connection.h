@@ -78,7 +78,10 @@ class Connection : public std::enable_shared_from_this<Connection> {
   Connection(const Connection&) = delete;
   Connection& operator=(const Connection&) = delete;
 
-  const std::string& ConnectionString() const { return connectionString_; }
+  // The property as ADO reads it: once the connection has opened with "Persist
+  // Security Info" not True, without the password, which the connection keeps to itself
+  // for opening again.
+  std::string ConnectionString() const;
   // Raises 3705 while open, as the property is read-only then.
   void SetConnectionString(std::string text);
 
@@ -111,6 +114,7 @@ class Connection : public std::enable_shared_from_this<Connection> {
   [[noreturn]] void Raise(const EngineFailure& failure);
 
   std::string connectionString_;
+  bool passwordHidden_ = false;
   std::unique_ptr<Engine> engine_;
   ado::Errors errors_;
 };

@@ -117,6 +117,10 @@ void ConnectionStringParts::Set(std::string_view key, std::string_view value) {
   pairs_.emplace_back(std::string(key), std::string(value));
 }
 
+void ConnectionStringParts::Remove(std::string_view key) {
+  std::erase_if(pairs_, [&](const Pair& pair) { return EqualsNoCase(pair.first, key); });
+}
+
 std::string ConnectionStringParts::ToString() const { return BuildConnectionString(pairs_); }
 
 std::string ConnectionStringElement(std::string_view key, std::string_view value) {

@@ -24,6 +24,7 @@ class ConnectionStringParts {
   std::string GetOr(std::string_view key, std::string_view fallback) const;
   // Sets (or replaces) a key's value, keeping the order of first appearance.
   void Set(std::string_view key, std::string_view value);
+  void Remove(std::string_view key);
 
   const std::vector<Pair>& Pairs() const { return pairs_; }
   // The string again, every value quoted when it needs to be.

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "AdoFixture.h"
+#include "platform/ado/ConnectionString.h"
 #include "platform/ado/Errors.h"
 #include "platform/vb/Error.h"
 
@@ -48,7 +49,7 @@ TEST_F(ConnectionBehaviour, reconnect_probe_inside_will_execute_runs_and_may_reo
   // re-open a connection found closed before the statement runs.
   bool probing = false;
   int probes = 0;
-  std::string cs = conn_->ConnectionString();
+  std::string cs = ConnectionString(kUser, kPassword);
   conn_->WillExecute = [&](WillExecuteEvent&) {
     if (probing) return;
     probing = true;
@@ -117,6 +118,26 @@ TEST_F(ConnectionBehaviour, logins_are_checked_at_open) {
             kErrProviderFailed);
   EXPECT_EQ(ErrorNumberOf([&] { missing->Open("Provider=SQLOLEDB.1;Data Source=SERVIDOR01;User ID=sa"); }),
             kErrProviderFailed);
+}
+
+// As ADO does: once open, the property no longer shows the password unless the string
+// asks to persist it; the connection still opens again with it.
+TEST_F(ConnectionBehaviour, the_password_is_not_shown_after_open_unless_persisted) {
+  EXPECT_EQ(conn_->ConnectionString().find("s3gr3d0"), std::string::npos) << conn_->ConnectionString();
+  EXPECT_NE(conn_->ConnectionString().find("User ID=contabilista"), std::string::npos);
+  conn_->Close();
+  conn_->Open();
+  EXPECT_EQ(conn_->State(), adStateOpen);
+  conn_->Close();
+
+  ConnectionStringParts parts = ConnectionStringParts::Parse(ConnectionString(kUser, kPassword));
+  parts.Set("Persist Security Info", "True");
+  conn_->Open(parts.ToString());
+  EXPECT_NE(conn_->ConnectionString().find("s3gr3d0"), std::string::npos);
+  conn_->Close();
+  // A new string is shown as given until it opens.
+  conn_->SetConnectionString(ConnectionString(kUser, kPassword));
+  EXPECT_NE(conn_->ConnectionString().find("s3gr3d0"), std::string::npos);
 }
 
 TEST_F(ConnectionBehaviour, errors_collection_keeps_the_last_failure_until_cleared) {
