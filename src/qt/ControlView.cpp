@@ -182,6 +182,8 @@ bool ControlView::OnKey(QKeyEvent& event) {
 bool ControlView::OnMousePress(QMouseEvent& event, QWidget& target) {
   doubleClicked_ = false;
   pressed_ = Qt::NoButton;
+  window_.PressedByPerson();
+  if (!window_.Live()) return true;
   if (!FocusForClick()) return true;
   pressed_ = event.button();
   QPoint pos = event.position().toPoint();

@@ -185,6 +185,7 @@ void FormWindow::ShowForm(bool modal) {
       windowHandle()->setTransientParent(owner->windowHandle());
   }
   SyncWindowState();
+  renderer_.ActivationRequested();
   show();
   raise();
   activateWindow();
@@ -215,6 +216,7 @@ void FormWindow::ChangeOrder(int32_t insertAfter) {
   if (insertAfter == forms::HWND_BOTTOM) {
     lower();
   } else if (isVisible()) {
+    renderer_.ActivationRequested();
     raise();
     activateWindow();
   }
@@ -224,7 +226,10 @@ void FormWindow::MirrorFocus() {
   if (!live_ || !form_.Showing()) return;
   // The model's active form is the one the keyboard works: a window hidden or closed
   // hands the activation on in the model, and Qt's follows it here.
-  if (forms::ActiveForm() == &form_ && isVisible() && !isActiveWindow()) activateWindow();
+  if (forms::ActiveForm() == &form_ && isVisible() && !isActiveWindow()) {
+    renderer_.ActivationRequested();
+    activateWindow();
+  }
   forms::Control* active = form_.ActiveControl();
   ControlView* view = ViewOf(active);
   QWidget* target = view ? view->widget() : nullptr;
@@ -257,6 +262,8 @@ bool FormWindow::event(QEvent* event) {
     return true;
   } else if (event->type() == QEvent::KeyRelease) {
     return true;
+  } else if (event->type() == QEvent::MouseButtonPress) {
+    PressedByPerson();
   }
   return QWidget::event(event);
 }
@@ -302,8 +309,16 @@ void FormWindow::changeEvent(QEvent* event) {
     if (form_.Showing() && state != form_.WindowState())
       Input([&] { form_.SetWindowState(state); });
   } else if (event->type() == QEvent::ActivationChange && isActiveWindow() && form_.Showing()) {
-    Input([&] { form_.Activate(); });
+    if (renderer_.QtActivated(*this)) Input([&] { form_.Activate(); });
   }
+}
+
+void FormWindow::PressedByPerson() {
+  // A click is a person's activation of its window even where the window system
+  // reports none, or reports it while one of our own requests is in flight.
+  if (!live_ || !form_.Showing() || forms::ActiveForm() == &form_) return;
+  renderer_.ActivationSettled();
+  Input([&] { form_.Activate(); });
 }
 
 }  // namespace dvqt

@@ -51,6 +51,8 @@ class FormWindow : public QWidget {
   void ChangeOrder(int32_t insertAfter);
   // Gives Qt's keyboard focus to the view of the model's focused control.
   void MirrorFocus();
+  // A mouse button pressed anywhere in the window: its form becomes the active one.
+  void PressedByPerson();
 
   // The client size in pixels for the model's outer size in twips, and back.
   QSize ClientSizeFor(int32_t width, int32_t height) const;

@@ -110,7 +110,10 @@ void Renderer::FormShown(forms::Form& form, bool modal) {
 }
 
 void Renderer::FormHidden(forms::Form& form) {
-  if (FormWindow* window = WindowOf(form)) window->HideForm();
+  if (FormWindow* window = WindowOf(form)) {
+    ActivationRequested();
+    window->HideForm();
+  }
   StopWaiters(form);
   FollowActivation();
 }
@@ -120,6 +123,7 @@ void Renderer::FormUnloaded(forms::Form& form) {
   if (onUnloaded) onUnloaded(form);
   auto found = windows_.find(&form);
   if (found == windows_.end()) return;
+  ActivationRequested();
   found->second->Retire();
   retired_.push_back(std::move(found->second));
   windows_.erase(found);
@@ -133,6 +137,43 @@ void Renderer::FollowActivation() {
     forms::Form* active = forms::ActiveForm();
     if (active && IsLoadedForm(active)) MirrorFocus(*active);
   });
+}
+
+// ---- activation ---------------------------------------------------------------------------
+
+namespace {
+// A window system that keeps activating another window after this many requests of
+// ours has the last word: the model then follows where the keyboard really is.
+constexpr int kMaxOverruled = 3;
+}  // namespace
+
+// Asking again for the activation Qt just took elsewhere keeps the count of refusals.
+void Renderer::ActivationRequested() { pending_ = true; }
+
+void Renderer::ActivationSettled() {
+  pending_ = false;
+  overruled_ = 0;
+}
+
+bool Renderer::QtActivated(FormWindow& window) {
+  forms::Form* wanted = forms::ActiveForm();
+  FormWindow* target = wanted && IsLoadedForm(wanted) && wanted->Showing() ? WindowOf(*wanted) : nullptr;
+  if (&window == target) {
+    ActivationSettled();
+    return false;
+  }
+  // Nothing of ours in flight, or nothing the model wants shown: a person's choice.
+  if (!pending_ || !target || !target->isVisible() || ++overruled_ > kMaxOverruled) {
+    ActivationSettled();
+    return true;
+  }
+  // The window system's own consequence of our show or hide: the model's active form
+  // keeps the activation, and Qt is brought back to it once this report is done.
+  QTimer::singleShot(0, &later_, [this] {
+    forms::Form* active = forms::ActiveForm();
+    if (active && IsLoadedForm(active)) MirrorFocus(*active);
+  });
+  return false;
 }
 
 void Renderer::FormChanged(forms::Form& form, std::string_view property) {

@@ -45,6 +45,19 @@ class Renderer : public forms::FormListener {
   // Told after a form's window went with its unload.
   std::function<void(const forms::Form&)> onUnloaded;
 
+  // Activation. The model decides which form is active; Qt's activation follows it.
+  // Every show, hide, raise or activation request of ours makes the window system
+  // activate windows on its own for a while (the window under a hidden one, say),
+  // and those reports must not take the model's choice back. ActivationRequested
+  // marks a request of ours in flight until Qt activates the model's active form;
+  // meanwhile Qt's activation of another window is not a person's.
+  void ActivationRequested();
+  // Whether the model should take Qt's activation of this window as a person's.
+  bool QtActivated(FormWindow& window);
+  // Nothing of ours is in flight any more: Qt activated the model's active form, or
+  // a person chose a window (a mouse button pressed in it).
+  void ActivationSettled();
+
   void FormLoaded(forms::Form& form) override;
   void FormShown(forms::Form& form, bool modal) override;
   void FormHidden(forms::Form& form) override;
@@ -70,6 +83,10 @@ class Renderer : public forms::FormListener {
   std::unordered_multimap<const forms::Form*, QEventLoop*> waiters_;
   int depth_ = 0;
   bool reapPending_ = false;
+  // An activation of ours that Qt has not confirmed yet, and how often Qt activated
+  // another window meanwhile.
+  bool pending_ = false;
+  int overruled_ = 0;
   // Owns the timers of deferred work, so none fires after the renderer is gone.
   QObject later_;
 };

@@ -115,6 +115,35 @@ TEST_F(QtDesktopTest, TopMostWindowsStayOnTop) {
   EXPECT_EQ(Window(form)->winId(), native);
 }
 
+TEST_F(QtDesktopTest, TheModelsActiveFormKeepsTheKeyboardUntilAPersonActivatesAnother) {
+  // The header editor (form) saves a line: its editor hides, the next one shows, and
+  // the window system activates whatever was under the one that hid.
+  SampleForm saved, next;
+  ShowActive(form);
+  ShowActive(saved);
+  ASSERT_EQ(forms::ActiveForm(), &saved);
+  saved.Hide();
+  next.Show();
+  saved.Unload();
+  EXPECT_TRUE(QTest::qWaitFor([&] { return Window(next)->isActiveWindow(); }, 2000));
+  Settle();
+  EXPECT_EQ(forms::ActiveForm(), &next);
+  EXPECT_TRUE(Window(next)->isActiveWindow());
+  EXPECT_EQ(QApplication::focusWidget(), WidgetOf(next.Text1));
+
+  // A person's click in another window makes its form the active one.
+  QTest::mouseClick(WidgetOf(form.Text2), Qt::LeftButton, {}, QPoint(5, 5));
+  EXPECT_EQ(forms::ActiveForm(), &form);
+  EXPECT_TRUE(QTest::qWaitFor([&] { return Window(form)->isActiveWindow(); }, 2000));
+  EXPECT_EQ(QApplication::focusWidget(), WidgetOf(form.Text2));
+
+  // So does the window manager's activation, with nothing of ours in flight.
+  Settle();
+  Window(next)->activateWindow();
+  EXPECT_TRUE(QTest::qWaitFor([&] { return forms::ActiveForm() == &next; }, 2000));
+  next.Unload();
+}
+
 TEST_F(QtDesktopTest, ANoticeReturnsWhileItIsOnScreenAndGoesWhenDismissed) {
   form.Show();
   forms::Desktop::Current().ShowNotice("Ravelport", "Falha na gravação do lançamento");
