@@ -60,6 +60,7 @@ void ControlView::Sync(std::string_view property) {
   } else if (property == "Enabled") {
     widget_->setEnabled(control_.Enabled());
   } else if (property == "Visible") {
+    if (control_.Visible()) Flush();
     widget_->setVisible(control_.Visible());
   } else if (property == "BackColor") {
     ApplyBackColor(*widget_, control_.BackColor());
@@ -102,6 +103,9 @@ void ControlView::Defer() {
 
 void ControlView::Flush() {
   if (!stale_ || !window_.Live()) return;
+  // A hidden control is rebuilt once, when it shows: a tree filled behind a progress
+  // bar would otherwise be rebuilt whole at every step the bar is drawn.
+  if (!control_.Visible()) return;
   stale_ = false;
   Rebuild();
 }

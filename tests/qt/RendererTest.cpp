@@ -139,6 +139,26 @@ TEST_F(QtDesktopTest, ListsTreesAndToolbarsFollowTheirCollections) {
   EXPECT_FALSE(bar->actions().at(1)->isVisible());
 }
 
+// A tree filled while hidden behind a progress bar, the window answering between the
+// steps, is built once when it shows, not again at every step.
+TEST_F(QtDesktopTest, AHiddenTreeIsBuiltOnceWhenItShows) {
+  form.Show();
+  auto* tree = WidgetOf<QTreeWidget>(form.TreeView1);
+  form.TreeView1.SetVisible(false);
+  forms::NodeList& nodes = form.TreeView1.Nodes();
+  for (int n = 1; n <= 50; ++n) {
+    nodes.Add("#" + std::to_string(n), std::to_string(n));
+    Settle();
+  }
+  EXPECT_EQ(tree->topLevelItemCount(), 0) << "rebuilt while hidden";
+  form.TreeView1.SetVisible(true);
+  EXPECT_TRUE(tree->isVisible());
+  ASSERT_EQ(tree->topLevelItemCount(), 50);
+  EXPECT_EQ(tree->topLevelItem(49)->text(0), QStringLiteral("50"));
+  nodes("#50").SetText("cinquenta");
+  EXPECT_EQ(tree->topLevelItem(49)->text(0), QStringLiteral("cinquenta"));
+}
+
 TEST_F(QtDesktopTest, LabelsShowMnemonicsOnlyWithAControlToFocus) {
   form.Show();
   // The label hands its mnemonic to the next control in tab order.
