@@ -25,11 +25,12 @@ forms::FormDesign frmRecordFinder::Design() {
                .width = 2400, .height = 255, .caption = "Código ou nome:"},
               {.name = "Text1", .type = ControlType::TextBox, .left = 2520, .top = 120,
                .width = 5640, .height = 315, .properties = {{"TabIndex", 0}}},
+              // The columns fit inside the list beside its vertical scroll bar.
               {.name = "ListView1", .type = ControlType::ListView, .left = 120, .top = 600,
                .width = 8040, .height = 4320, .properties = {{"TabIndex", 1}},
                .items = {{.key = "codigo", .caption = "Código", .width = 1500},
                          {.key = "descrit", .caption = "Descrição", .width = 3900},
-                         {.key = "conta", .caption = "Conta", .width = 2500}}},
+                         {.key = "conta", .caption = "Conta", .width = 2200}}},
               {.name = "Command1", .type = ControlType::CommandButton, .left = 5640, .top = 5100,
                .width = 1215, .height = 375, .caption = "&OK", .properties = {{"TabIndex", 2}}},
               {.name = "Command2", .type = ControlType::CommandButton, .left = 6960, .top = 5100,

@@ -10,8 +10,9 @@ namespace {
 
 // Twips. The tree fills the window above a bottom row, where the progress bar with
 // its label stands on the left while the tree is built and the two buttons keep to
-// the right corner.
-constexpr int32_t kFormWidth = 6840;
+// the right corner. The window is as wide as the progress label's caption needs beside
+// the buttons.
+constexpr int32_t kFormWidth = 7440;
 constexpr int32_t kFormHeight = 7440;
 constexpr int32_t kMargin = 120;
 constexpr int32_t kInnerWidth = kFormWidth - 3 * kMargin;  // inside the window's borders
@@ -23,6 +24,9 @@ constexpr int32_t kButtonHeight = 405;
 constexpr int32_t kCancelarLeft = kMargin + kInnerWidth - kButtonWidth;
 constexpr int32_t kSelecionarLeft = kCancelarLeft - kMargin - kButtonWidth;
 constexpr int32_t kProgressWidth = kSelecionarLeft - 2 * kMargin;
+// The label a full line of text high, the bar under it.
+constexpr int32_t kProgressLabelHeight = 255;
+constexpr int32_t kProgressBarTop = kBottomRow + kProgressLabelHeight + 15;
 
 }  // namespace
 
@@ -81,11 +85,11 @@ forms::FormDesign frmFindConta::Design() {
            .container = "TreeView1_Border"},
           // Shown only while the tree is being built.
           {.name = "ProgressBar1_Label", .type = ControlType::Label, .left = kMargin,
-           .top = kBottomRow, .width = kProgressWidth, .height = 195,
+           .top = kBottomRow, .width = kProgressWidth, .height = kProgressLabelHeight,
            .caption = "Construindo a Estrutura Contabilística ...",
            .properties = {{"Visible", false}}},
           {.name = "ProgressBar1", .type = ControlType::ProgressBar, .left = kMargin,
-           .top = kBottomRow + 210, .width = kProgressWidth, .height = 195,
+           .top = kProgressBarTop, .width = kProgressWidth, .height = 195,
            .properties = {{"Visible", false}}},
           {.name = "Command2", .type = ControlType::CommandButton, .left = kSelecionarLeft,
            .top = kBottomRow, .width = kButtonWidth, .height = kButtonHeight,

@@ -5,13 +5,15 @@ namespace component {
 namespace {
 
 // Twips. The texts sit right of the icon; the two buttons share the bottom row, the
-// way out on the left and the retry on the right.
-constexpr int32_t kFormWidth = 6360;
+// way out on the left and the retry on the right. The window is wide enough for the
+// first explanation on one line and the second on two, each inside its label's height.
+constexpr int32_t kFormWidth = 7800;
 constexpr int32_t kFormHeight = 3090;
 constexpr int32_t kMargin = 240;
 constexpr int32_t kIconSize = 480;
 constexpr int32_t kTextLeft = kMargin + kIconSize + kMargin;
-constexpr int32_t kTextWidth = 5040;
+constexpr int32_t kClientWidth = kFormWidth - 120;  // inside the window's borders
+constexpr int32_t kTextWidth = kClientWidth - kTextLeft - kMargin;
 constexpr int32_t kButtonTop = 2040;
 constexpr int32_t kButtonHeight = 405;
 constexpr int32_t kSairWidth = 1335;
@@ -54,7 +56,7 @@ forms::FormDesign frmSQLServer::Design() {
            .top = kButtonTop, .width = kSairWidth, .height = kButtonHeight, .caption = "&Sair",
            .properties = {{"Cancel", true}}},
           {.name = "Command1", .type = ControlType::CommandButton,
-           .left = kFormWidth - 120 - kMargin - kLigarWidth, .top = kButtonTop,
+           .left = kClientWidth - kMargin - kLigarWidth, .top = kButtonTop,
            .width = kLigarWidth, .height = kButtonHeight, .caption = "&Ligar ao servidor SQL"},
       }};
 }

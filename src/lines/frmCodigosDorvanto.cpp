@@ -31,13 +31,14 @@ forms::FormDesign frmCodigosDorvanto::Design() {
           .width = 6960,
           .height = 5400,
           .controls = {
+              // The buttons keep a margin above the window's bottom border.
               {.name = "ListView1", .type = ControlType::ListView, .left = 120, .top = 120,
-               .width = 6600, .height = 4320, .properties = {{"TabIndex", 0}},
+               .width = 6600, .height = 4200, .properties = {{"TabIndex", 0}},
                .items = {{.key = "codigo", .caption = "Código", .width = 1200},
                          {.key = "descrit", .caption = "Descrição", .width = 5100}}},
-              {.name = "Command2", .type = ControlType::CommandButton, .left = 4200, .top = 4560,
+              {.name = "Command2", .type = ControlType::CommandButton, .left = 4200, .top = 4440,
                .width = 1215, .height = 375, .caption = "&OK", .properties = {{"TabIndex", 1}}},
-              {.name = "Command1", .type = ControlType::CommandButton, .left = 5520, .top = 4560,
+              {.name = "Command1", .type = ControlType::CommandButton, .left = 5520, .top = 4440,
                .width = 1215, .height = 375, .caption = "Cancelar",
                .properties = {{"TabIndex", 2}}},
           }};

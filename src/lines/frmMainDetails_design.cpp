@@ -15,6 +15,9 @@ using forms::ControlType;
 constexpr int32_t kRowHeight = 315;
 constexpr int32_t kFieldLeft = 1440;
 constexpr int32_t kWideLeft = 3120;
+// Inside the VAT frame: the captions on one line, "Base Tributável:" the longest.
+constexpr int32_t kVatLabelWidth = 1620;
+constexpr int32_t kVatFieldLeft = 1800;
 
 ControlDesign LabelAt(const char* name, const char* text, int32_t left, int32_t top,
                       int32_t width = 1260) {
@@ -56,7 +59,7 @@ forms::FormDesign frmMainDetails::Design() {
   debit.properties.push_back({"FontBold", true});
   ControlDesign credit = Field("FXCredito", 4560, 2760, 1800, 6, true);
   credit.properties.push_back({"FontBold", true});
-  ControlDesign base = ShownField("FXIVA_Base_Tributavel", 1560, 1140, 1800, true);
+  ControlDesign base = ShownField("FXIVA_Base_Tributavel", kVatFieldLeft, 1140, 1800, true);
   base.container = "Frame1";
 
   return {
@@ -70,7 +73,7 @@ forms::FormDesign frmMainDetails::Design() {
           LabelAt("FXDorvanto_No_Label", "Lançam. Nº:", 120, 600),
           ShownField("FXDorvanto_No", kFieldLeft, 600, 1800),
           LabelAt("FXData_Label", "Data:", 3600, 600, 600),
-          ShownField("FXData", 4560, 600, 1800),
+          ShownField("FXData", 4560, 600, 2280),
 
           LabelAt("FXConta_Codigo_Label", "Conta:", 120, 1080),
           Field("FXConta_Codigo", kFieldLeft, 1080, 1080, 0, true),
@@ -104,14 +107,14 @@ forms::FormDesign frmMainDetails::Design() {
            .width = 2400, .height = 255, .caption = "Apuramento", .container = "Frame1",
            .properties = {{"TabIndex", 9}}},
           {.name = "FXIVA_Tx_ID_Label", .type = ControlType::Label, .left = 120, .top = 720,
-           .width = 1380, .height = 255, .caption = "Taxa de IVA:", .container = "Frame1"},
-          {.name = "FXIVA_Tx_ID", .type = ControlType::ComboBox, .left = 1560, .top = 690,
+           .width = kVatLabelWidth, .height = 255, .caption = "Taxa de IVA:", .container = "Frame1"},
+          {.name = "FXIVA_Tx_ID", .type = ControlType::ComboBox, .left = kVatFieldLeft, .top = 690,
            .width = 4200, .height = kRowHeight, .container = "Frame1",
            .properties = {{"Style", forms::vbComboDropDownList},
                           {"BackColor", forms::vbButtonFace},
                           {"TabIndex", 8}}},
           {.name = "FXIVA_Base_Tributavel_Label", .type = ControlType::Label, .left = 120,
-           .top = 1170, .width = 1380, .height = 255, .caption = "Base Tributável:",
+           .top = 1170, .width = kVatLabelWidth, .height = 255, .caption = "Base Tributável:",
            .container = "Frame1"},
           base,
 
