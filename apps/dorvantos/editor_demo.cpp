@@ -119,12 +119,12 @@ void PrintJournal() {
     fmt::print("{:>6}  {:<12}  {:<40}  {:<24}  {:>12}  {:>12}\n", "Reg.", "Subconta",
                "Subconta (Descrição)", "Descrição", "Débito", "Crédito");
     ado::RecordsetPtr lines = db->Execute(fmt::format(
-        "SELECT reg_no, sub_conta, sub_conta_descrit, descrit, debito, credito FROM "
+        "SELECT reg_no, codigo_completo, sub_conta_descrit, descrit, debito, credito FROM "
         "tbPOC_Dorvantos_Details WHERE dorvanto_id = {} ORDER BY diario_id",
         id));
     for (; !lines->Eof(); lines->MoveNext()) {
       fmt::print("{:>6}  {:<12}  {:<40}  {:<24}  {:>12}  {:>12}\n",
-                 Cell(lines, "reg_no", common::kListText), Cell(lines, "sub_conta", common::kListText),
+                 Cell(lines, "reg_no", common::kListText), Cell(lines, "codigo_completo", common::kListText),
                  Cell(lines, "sub_conta_descrit", common::kListText),
                  Cell(lines, "descrit", common::kListText),
                  Cell(lines, "debito", common::kListNumber),

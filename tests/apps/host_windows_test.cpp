@@ -277,6 +277,9 @@ TEST_F(DemoCommand, KeepsOneEntryToTheEndAndPrintsTheJournal) {
   EXPECT_NE(out.find("Finalizado", journal), std::string::npos) << out;
   EXPECT_NE(out.find("Venda a dinheiro", journal), std::string::npos) << out;
   EXPECT_NE(out.find("Depósito na CGD", journal), std::string::npos) << out;
+  // Sub-accounts by their whole code, as the header editor lists them.
+  EXPECT_NE(out.find("11001", journal), std::string::npos) << out;
+  EXPECT_NE(out.find("12001", journal), std::string::npos) << out;
   EXPECT_NE(out.find("100,00", journal), std::string::npos) << out;
 }
 
