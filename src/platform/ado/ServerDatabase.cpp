@@ -40,56 +40,6 @@ std::string QuoteName(bool postgres, const std::string& name) {
   return out + "]";
 }
 
-// PostgreSQL scripts split at ";" outside quotes, comments and $tag$ bodies, where a
-// function's own statements live.
-std::vector<std::string> SplitPostgresScript(std::string_view script) {
-  std::vector<std::string> out;
-  std::string current;
-  auto flush = [&] {
-    if (current.find_first_not_of(" \t\r\n") != std::string::npos) out.push_back(current);
-    current.clear();
-  };
-  for (size_t i = 0; i < script.size();) {
-    char c = script[i];
-    auto copyUntil = [&](std::string_view end, size_t from) {
-      size_t stop = script.find(end, from);
-      size_t to = stop == std::string_view::npos ? script.size() : stop + end.size();
-      current.append(script.substr(i, to - i));
-      i = to;
-    };
-    if (c == '\'' || c == '"') {
-      size_t j = i + 1;
-      while (j < script.size()) {
-        if (script[j] == c) {
-          if (j + 1 < script.size() && script[j + 1] == c) { j += 2; continue; }
-          break;
-        }
-        ++j;
-      }
-      size_t to = std::min(j + 1, script.size());
-      current.append(script.substr(i, to - i));
-      i = to;
-    } else if (script.substr(i, 2) == "--") {
-      copyUntil("\n", i);
-    } else if (script.substr(i, 2) == "/*") {
-      copyUntil("*/", i + 2);
-    } else if (c == '$') {
-      size_t close = script.find('$', i + 1);
-      std::string_view tag = close == std::string_view::npos ? "" : script.substr(i, close - i + 1);
-      bool isTag = !tag.empty() && tag.find_first_of(" \t\r\n;'\"") == std::string_view::npos;
-      if (isTag) copyUntil(tag, i + tag.size());
-      else current += script[i++];
-    } else if (c == ';') {
-      flush();
-      ++i;
-    } else {
-      current += script[i++];
-    }
-  }
-  flush();
-  return out;
-}
-
 // SQL Server scripts are batches between lines that say only GO.
 std::vector<std::string> SplitBatches(std::string_view script) {
   std::vector<std::string> out;
@@ -183,7 +133,8 @@ void GrantLogins(OdbcEngine& db, bool postgres, const std::vector<Login>& logins
 
 void Populate(OdbcEngine& db, bool postgres, const ServerSetup& setup) {
   std::string_view schema = ServerSchema(postgres);
-  for (const std::string& statement : postgres ? SplitPostgresScript(schema) : SplitBatches(schema))
+  // The PostgreSQL schema quotes its function bodies, so it splits at ";" as any script.
+  for (const std::string& statement : postgres ? sql::SplitStatements(schema) : SplitBatches(schema))
     db.ExecuteNative(statement);
   GrantLogins(db, postgres, setup.logins);
   if (!setup.demoData) return;
