@@ -16,11 +16,15 @@ namespace {
 
 bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n'; }
 
+}  // namespace
+
 std::string_view Trim(std::string_view s) {
   while (!s.empty() && IsBlank(s.front())) s.remove_prefix(1);
   while (!s.empty() && IsBlank(s.back())) s.remove_suffix(1);
   return s;
 }
+
+namespace {
 
 // Reads a key up to its "=", where "==" stands for an "=" inside the key.
 std::string ReadKey(std::string_view text, size_t& pos) {

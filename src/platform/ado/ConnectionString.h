@@ -41,6 +41,9 @@ std::string ConnectionStringElement(std::string_view key, std::string_view value
 // A whole connection string from pairs, in order, each element as above.
 std::string BuildConnectionString(const std::vector<ConnectionStringParts::Pair>& pairs);
 
+// Text without the blanks (spaces, tabs, line ends) at either end.
+std::string_view Trim(std::string_view s);
+
 // ASCII case-insensitive equality, as keys and identifiers compare.
 bool EqualsNoCase(std::string_view a, std::string_view b);
 

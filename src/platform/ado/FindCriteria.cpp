@@ -22,12 +22,6 @@ namespace {
                   "ADODB.Recordset");
 }
 
-std::string_view Trim(std::string_view s) {
-  while (!s.empty() && std::isspace(static_cast<unsigned char>(s.front()))) s.remove_prefix(1);
-  while (!s.empty() && std::isspace(static_cast<unsigned char>(s.back()))) s.remove_suffix(1);
-  return s;
-}
-
 vb::Variant ReadValue(std::string_view v) {
   if (v.size() >= 2 && (v.front() == '\'' || v.front() == '"') && v.back() == v.front()) {
     std::string out;

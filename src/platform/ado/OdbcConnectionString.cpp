@@ -35,18 +35,11 @@ void SplitHostPort(std::string_view text, std::string& host, std::string& port) 
   }
 }
 
-std::string Trimmed(std::string_view s) {
-  size_t b = s.find_first_not_of(" \t");
-  if (b == std::string_view::npos) return {};
-  size_t e = s.find_last_not_of(" \t");
-  return std::string(s.substr(b, e - b + 1));
-}
-
 }  // namespace
 
 ServerAddress ParseServerAddress(std::string_view dataSource) {
   ServerAddress address;
-  std::string source = Trimmed(dataSource);
+  std::string source(Trim(dataSource));
   if (source.size() >= kPostgresScheme.size() &&
       EqualsNoCase(std::string_view(source).substr(0, kPostgresScheme.size()), kPostgresScheme)) {
     address.kind = ServerKind::PostgreSQL;
@@ -59,8 +52,8 @@ ServerAddress ParseServerAddress(std::string_view dataSource) {
   }
   address.kind = ServerKind::SqlServer;
   if (size_t comma = source.find(','); comma != std::string::npos) {
-    address.host = Trimmed(std::string_view(source).substr(0, comma));
-    address.port = Trimmed(std::string_view(source).substr(comma + 1));
+    address.host = Trim(std::string_view(source).substr(0, comma));
+    address.port = Trim(std::string_view(source).substr(comma + 1));
   } else if (size_t slash = source.find('\\'); slash != std::string::npos) {
     address.host = source.substr(0, slash);
     address.instance = source.substr(slash + 1);
@@ -111,7 +104,7 @@ std::string OdbcElement(std::string_view key, std::string_view value) {
 }
 
 std::string BareElement(std::string_view key, const std::string& value) {
-  if (value.find_first_of(";{}") != std::string::npos || value != Trimmed(value))
+  if (value.find_first_of(";{}") != std::string::npos || value != Trim(value))
     throw std::invalid_argument("the " + std::string(key == "UID" ? "login" : key == "Database" ? "database" : "server") +
                                 " name holds a character the PostgreSQL driver cannot take");
   return std::string(key) + "=" + value + ";";

@@ -40,6 +40,11 @@ std::string QuoteName(bool postgres, const std::string& name) {
   return out + "]";
 }
 
+// A login's name as the server keeps it, quoted.
+std::string LoginName(bool postgres, const Login& login) {
+  return QuoteName(postgres, postgres ? FoldLoginName(login.name) : login.name);
+}
+
 // SQL Server scripts are batches between lines that say only GO.
 std::vector<std::string> SplitBatches(std::string_view script) {
   std::vector<std::string> out;
@@ -99,7 +104,7 @@ void DropDatabase(OdbcEngine& server, bool postgres, const std::string& catalog)
 
 void CreateLogins(OdbcEngine& server, bool postgres, const std::vector<Login>& logins) {
   for (const Login& login : logins) {
-    const std::string name = QuoteName(postgres, postgres ? FoldLoginName(login.name) : login.name);
+    const std::string name = LoginName(postgres, login);
     if (postgres) {
       bool exists = server.ExecuteNative("SELECT 1 FROM pg_roles WHERE rolname = " +
                                          sql::QuoteLiteral(FoldLoginName(login.name)))
@@ -119,7 +124,7 @@ void CreateLogins(OdbcEngine& server, bool postgres, const std::vector<Login>& l
 // The logins work the ledger's tables; they do not own them.
 void GrantLogins(OdbcEngine& db, bool postgres, const std::vector<Login>& logins) {
   for (const Login& login : logins) {
-    const std::string name = QuoteName(postgres, postgres ? FoldLoginName(login.name) : login.name);
+    const std::string name = LoginName(postgres, login);
     if (postgres) {
       db.ExecuteNative("GRANT SELECT, INSERT, UPDATE, DELETE ON ALL TABLES IN SCHEMA public TO " + name);
       db.ExecuteNative("GRANT USAGE, SELECT ON ALL SEQUENCES IN SCHEMA public TO " + name);
@@ -192,12 +197,14 @@ void CreateServerDatabase(const ServerSetup& setup) {
     created = true;
     CreateLogins(*server, postgres, setup.logins);
     Populate(*Connect(setup, setup.catalog), postgres, setup);
-  } catch (const EngineFailure& e) {
-    if (created && server) try { DropDatabase(*server, postgres, setup.catalog); } catch (...) {}
-    throw std::runtime_error("cannot create the database: " + Reason(e));
   } catch (...) {
+    // A database begun here does not stay half made.
     if (created && server) try { DropDatabase(*server, postgres, setup.catalog); } catch (...) {}
-    throw;
+    try {
+      throw;
+    } catch (const EngineFailure& e) {
+      throw std::runtime_error("cannot create the database: " + Reason(e));
+    }
   }
 }
 
